@@ -1,0 +1,57 @@
+/* Device file system and device services. On a handset these are plain
+ * pass-throughs; on the host every absolute device path is taken inside the
+ * device root ($FTX_ROOT) and nothing reaches the real machine. */
+#ifndef FTX_DEVFS_H
+#define FTX_DEVFS_H
+
+#include <dirent.h>
+#include <stddef.h>
+#include <stdio.h>
+#include <sys/stat.h>
+#include <sys/types.h>
+
+#ifdef __cplusplus
+extern "C" {
+#endif
+
+/* Linux reboot commands, as the handset's reboot() takes them. */
+#define LINUX_REBOOT_CMD_RESTART 0x01234567
+#define LINUX_REBOOT_CMD_POWER_OFF 0x4321FEDC
+
+/* Host exit statuses of dev_reboot; the launcher restarts on a reboot. */
+#define DEV_EXIT_POWER_OFF 100
+#define DEV_EXIT_REBOOT 101
+
+/* The device root folder (no trailing slash). */
+const char *dev_root(void);
+
+/* Maps a device path into the device root. Absolute paths are normalised
+ * ("." and ".." resolved, never above the root) and prefixed with the root;
+ * relative paths are copied unchanged. Returns 0, or -1 when out is too small. */
+int dev_path(const char *path, char *out, size_t size);
+
+FILE *dev_fopen(const char *path, const char *mode);
+int dev_open(const char *path, int flags, ...);
+int dev_access(const char *path, int mode);
+int dev_stat(const char *path, struct stat *st);
+int dev_mkdir(const char *path, mode_t mode);
+int dev_unlink(const char *path);
+int dev_rename(const char *from, const char *to);
+DIR *dev_opendir(const char *path);
+
+/* Runs a device shell line and returns its wait status as system() does. */
+int dev_system(const char *cmd);
+
+/* Powers off or reboots (cmd is a LINUX_REBOOT_CMD_...). Never returns on the host. */
+int dev_reboot(int cmd);
+void dev_sync(void);
+int dev_mount(const char *source, const char *target, const char *fstype, unsigned long flags,
+              const void *data);
+
+/* The host name of a handset network interface ("wlan0" -> "lo" by default). */
+const char *dev_ifname(const char *name);
+
+#ifdef __cplusplus
+}
+#endif
+#endif
