@@ -127,7 +127,8 @@ extern "C" int __android_log_write(int prio, const char *tag, const char *text) 
 
 extern "C" int __android_log_vprint(int prio, const char *tag, const char *fmt, va_list ap) {
     char buf[4096];
-    vsnprintf(buf, sizeof(buf), fmt != nullptr ? fmt : "", ap);
+    if (fmt == nullptr) return __android_log_write(prio, tag, "");
+    vsnprintf(buf, sizeof(buf), fmt, ap);
     return __android_log_write(prio, tag, buf);
 }
 
