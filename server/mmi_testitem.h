@@ -1,0 +1,53 @@
+// The compiled-in test item catalogue and the lists built from it and the configuration.
+#pragma once
+
+#include <stdint.h>
+
+#define TESTITEM_TEXT_SIZE 256
+
+// A test window's entry returns the window (HWND) or HWND_INVALID; stop closes it.
+typedef void *(*testitem_entry_fn)(void);
+typedef int (*testitem_stop_fn)(void);
+
+struct testitem {
+    int32_t item_num;               // compiled-in number; in a list node its position in the list
+    char name[TESTITEM_TEXT_SIZE];  // language key of the title
+    testitem_entry_fn entry;
+    testitem_stop_fn stop;  // may be null
+    char config_domain[TESTITEM_TEXT_SIZE];
+    int32_t item_code;
+    int32_t item_enable;
+    int32_t item_auto;
+    int32_t item_mmi;
+    int32_t item_pre;
+    char parameter[TESTITEM_TEXT_SIZE];
+    int32_t spare;
+};
+
+struct testitem_node : testitem {
+    testitem_node *pNodeNext;
+};
+
+// The tables; their rows are updated in place by the builders.
+extern testitem TestItemWinMenu_TOTAL[];
+extern int g_testitemnum_total;  // 38
+extern testitem AuxLCD_TestItemWinMenu_TOTAL[];
+extern int g_AuxLCD_testitemnum_total;  // 5
+extern testitem MonomerPreview_TestItemWinMenu_TOTAL[];
+extern int g_MonomerPreview_testitemnum_total;  // 4
+
+// The test item list (main and auxiliary-LCD builds) and the monomer preview list.
+extern testitem_node *g_pTestItemListHead;
+extern int g_testItemListCount;
+extern testitem_node *g_pMonomerPreviewListHead;
+extern int g_monomerPreviewListCount;
+
+// Bit 0 of reset forgets the old list (nodes are never freed); without it new nodes are
+// appended behind the old ones. The count always restarts at 0. 0, or -1 when a lookup
+// failed and the build stopped.
+int Get_TestItem_Config(int reset);
+int Get_AuxLCD_TestItem_Config(int reset);
+int Get_MonomerPreviewTestItem_Config(void);
+
+// Main-table row whose config_domain is a prefix of domain, or -1.
+int ftx_config_Get_TestItem_Config_Paras(const char *domain);
