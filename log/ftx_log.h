@@ -4,6 +4,7 @@
 
 #include <stddef.h>
 #include <stdio.h>
+#include <time.h>
 
 // The main event log; null when it could not be opened (writes are then refused).
 extern FILE *s_logFp;
@@ -25,6 +26,10 @@ int uninit_ftxlog(FILE *stream);
 // Creates every missing directory of the device path; 0, or non-zero on failure. Not
 // re-entrant: call it under the log mutex (init_ftx_log does).
 int mkdir_main(const char *path);
+
+// Replaces the clock of the time stamps (tests); null restores time().
+typedef time_t (*ftx_log_clock_fn)(void);
+void ftx_log_set_clock(ftx_log_clock_fn fn);
 
 // The UTC time as asctime text into out (min(out_size, 256) bytes copied); 0.
 int Conver_time2ASC(long seconds, long nanoseconds, char *out, size_t out_size);
