@@ -1,0 +1,152 @@
+// ftx-pc: the test station's client for the handset's command channel.
+//   ftx-pc [-H HOST] [-p PORT] COMMAND...   sends one command, prints the reply; the exit
+//                                           status is the result (0, 2, 3; 1 no connection)
+//   ftx-pc [-H HOST] [-p PORT]              interactive prompt ("history", "!!", "!N")
+#include <stdio.h>
+#include <stdlib.h>
+#include <string.h>
+#include <unistd.h>
+
+#include <string>
+#include <vector>
+
+#include "pc_client.h"
+
+namespace {
+
+void usage() {
+    fprintf(stderr,
+            "usage: ftx-pc [-H HOST] [-p PORT] [COMMAND...]\n"
+            "  without a command: an interactive prompt (history, !!, !N, quit)\n");
+}
+
+void print_reply(const std::string &reply) {
+    fwrite(reply.data(), 1, reply.size(), stdout);
+    if (reply.empty() || reply.back() != '\n') fputc('\n', stdout);
+    fflush(stdout);
+}
+
+std::string history_path() {
+    const char *home = getenv("HOME");
+    return home != nullptr ? std::string(home) + "/.ftx_pc_history" : "";
+}
+
+std::vector<std::string> load_history() {
+    std::vector<std::string> h;
+    std::string path = history_path();
+    FILE *f = path.empty() ? nullptr : fopen(path.c_str(), "r");
+    if (f == nullptr) return h;
+    char line[4200];
+    while (fgets(line, sizeof(line), f) != nullptr) {
+        line[strcspn(line, "\n")] = '\0';
+        if (line[0] != '\0') h.push_back(line);
+    }
+    fclose(f);
+    return h;
+}
+
+void append_history(const std::string &line) {
+    std::string path = history_path();
+    FILE *f = path.empty() ? nullptr : fopen(path.c_str(), "a");
+    if (f == nullptr) return;
+    fprintf(f, "%s\n", line.c_str());
+    fclose(f);
+}
+
+// Expands "!!" and "!N" from the history; false when there is no such entry.
+bool expand(const std::vector<std::string> &history, std::string *line) {
+    if (line->empty() || (*line)[0] != '!') return true;
+    size_t index;
+    if (*line == "!!") {
+        if (history.empty()) return false;
+        index = history.size() - 1;
+    } else {
+        char *end = nullptr;
+        long n = strtol(line->c_str() + 1, &end, 10);
+        if (*end != '\0' || n < 1 || static_cast<size_t>(n) > history.size()) return false;
+        index = static_cast<size_t>(n - 1);
+    }
+    *line = history[index];
+    printf("%s\n", line->c_str());
+    return true;
+}
+
+int interactive(ftxpc::PcClient &client, const char *host, int port) {
+    std::vector<std::string> history = load_history();
+    bool tty = isatty(0);
+    char buf[8192];
+    for (;;) {
+        if (tty) {
+            printf("ftx-pc> ");
+            fflush(stdout);
+        }
+        if (fgets(buf, sizeof(buf), stdin) == nullptr) break;
+        std::string line(buf, strcspn(buf, "\r\n"));
+        if (line.empty()) continue;
+        if (line == "quit" || line == "exit") break;
+        if (line == "history") {
+            for (size_t i = 0; i < history.size(); ++i)
+                printf("%4zu  %s\n", i + 1, history[i].c_str());
+            continue;
+        }
+        if (!expand(history, &line)) {
+            printf("no such history entry\n");
+            continue;
+        }
+        history.push_back(line);
+        append_history(line);
+        std::string reply;
+        int result = client.command(line, &reply);
+        if (result < 0) {
+            // The handset may have restarted: connect once more and retry.
+            if (client.connect_to(host, port) != 0 || (result = client.command(line, &reply)) < 0) {
+                printf("connection to %s:%d lost\n", host, port);
+                continue;
+            }
+        }
+        printf("[%d] ", result);
+        print_reply(reply);
+    }
+    return 0;
+}
+
+}  // namespace
+
+int main(int argc, char **argv) {
+    const char *host = "127.0.0.1";
+    int port = 0;
+    int opt;
+    while ((opt = getopt(argc, argv, "+H:p:h")) != -1) {
+        switch (opt) {
+            case 'H':
+                host = optarg;
+                break;
+            case 'p':
+                port = atoi(optarg);
+                break;
+            default:
+                usage();
+                return opt == 'h' ? 0 : 1;
+        }
+    }
+    if (port <= 0) port = ftxpc::default_port();
+    ftxpc::PcClient client;
+    if (client.connect_to(host, port) != 0) {
+        fprintf(stderr, "ftx-pc: cannot connect to %s:%d\n", host, port);
+        return 1;
+    }
+    if (optind >= argc) return interactive(client, host, port);
+    std::string line;
+    for (int i = optind; i < argc; ++i) {
+        if (!line.empty()) line += ' ';
+        line += argv[i];
+    }
+    std::string reply;
+    int result = client.command(line, &reply);
+    if (result < 0) {
+        fprintf(stderr, "ftx-pc: no answer from %s:%d\n", host, port);
+        return 1;
+    }
+    print_reply(reply);
+    return result;
+}
