@@ -14,12 +14,13 @@ endfunction()
 # ftx_add_gtest(NAME SOURCES ... LIBS ...): one GoogleTest executable registered with CTest.
 function(ftx_add_gtest name)
   cmake_parse_arguments(A "" "" "SOURCES;LIBS" ${ARGN})
-  add_executable(${name} ${A_SOURCES})
+  add_executable(${name} ${A_SOURCES} ${PROJECT_SOURCE_DIR}/tests/support/test_env.cpp)
+  target_compile_definitions(${name} PRIVATE FTX_TEST_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
+    FTX_TEST_BUILD_DIR="${CMAKE_BINARY_DIR}")
   target_link_libraries(${name} PRIVATE ${A_LIBS} GTest::gtest GTest::gtest_main GTest::gmock Threads::Threads)
   target_include_directories(${name} PRIVATE ${PROJECT_SOURCE_DIR}/tests)
   set_target_properties(${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/tests)
-  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST
-    PROPERTIES ENVIRONMENT "FTX_SOURCE_DIR=${PROJECT_SOURCE_DIR};FTX_BUILD_DIR=${CMAKE_BINARY_DIR}")
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST)
 endfunction()
 
 # ftx_add_fuzz(NAME SOURCES ... LIBS ...): a libFuzzer target (fuzz builds only).

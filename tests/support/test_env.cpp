@@ -1,0 +1,11 @@
+// Every test program knows where the sources and the build are, run by ctest or by hand.
+#include <stdlib.h>
+
+namespace {
+
+__attribute__((constructor)) void set_test_paths() {
+    setenv("FTX_SOURCE_DIR", FTX_TEST_SOURCE_DIR, 0);
+    setenv("FTX_BUILD_DIR", FTX_TEST_BUILD_DIR, 0);
+}
+
+}  // namespace
