@@ -18,9 +18,9 @@ namespace {
 ftx_lang_record s_langList[FTX_LANG_LIST_SIZE];
 int s_langCount;
 
-// The parameter parser's work buffer is process-wide: parameter strings are parsed on
-// one thread at a time (start-up and the GUI thread).
-char s_paraPiece[FTX_CFG_TEXT_SIZE];
+// The parameter parser's work buffer. One per thread: the Wi-Fi and aging settings are
+// parsed off the GUI thread too.
+thread_local char s_paraPiece[FTX_CFG_TEXT_SIZE];
 
 bool is_blank(char c) {
     return c == '\t' || c == '\n' || c == ' ';

@@ -43,6 +43,8 @@ TEST(ParameterString, SkipsEmptyKeysAndStopsAtAPieceWithoutColon) {
     EXPECT_EQ((Pairs{{"a", "1"}}), parse(":5;a:1"));
     EXPECT_EQ((Pairs{{"a", "1"}}), parse("a:1;b;c:3"));
     EXPECT_EQ((Pairs{{"a", "1"}}), parse("a:1;"));
+    // The skip looks at the untrimmed key: blanks before ':' give an empty key.
+    EXPECT_EQ((Pairs{{"a", "1"}, {"", "2"}}), parse("a:1; :2"));
     EXPECT_EQ(Pairs{}, parse("a:"));  // shorter than 3
 }
 
