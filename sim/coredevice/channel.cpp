@@ -12,6 +12,7 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <atomic>
 #include <memory>
 #include <mutex>
@@ -50,6 +51,7 @@ std::atomic<bool> g_stop{false};
 std::atomic<unsigned long> g_served{0};
 std::atomic<int> g_clients{0};
 thread_local ChannelReply *t_reply = nullptr;
+size_t g_dirty = SIZE_MAX;  // reply bytes the last command may have written (loop thread only)
 
 int configured_port() {
     const char *env = getenv("FTX_PC_PORT");
@@ -68,14 +70,18 @@ void serve_line(Client &c, const std::string &line, bool overlong, std::vector<c
     long length = 0;
     if (!overlong) {
         FTX_AtCommandProcess_cb cb = g_cb.load();
-        memset(reply.data(), 0, reply.size());
+        // Only the part the previous command wrote needs clearing.
+        memset(reply.data(), 0, std::min(g_dirty, reply.size()));
+        g_dirty = 0;
         if (cb != nullptr) {
             ChannelReply ctx{reply.data(), reply.size(), -1};
             t_reply = &ctx;
             result = cb(line.c_str(), reply.data(), static_cast<unsigned int>(reply.size()));
             t_reply = nullptr;
             reply.back() = '\0';
-            length = ctx.length >= 0 ? ctx.length : static_cast<long>(strlen(reply.data()));
+            size_t text = strlen(reply.data());
+            length = ctx.length >= 0 ? ctx.length : static_cast<long>(text);
+            g_dirty = std::max(text, static_cast<size_t>(length)) + 1;
         } else {
             __android_log_print(ANDROID_LOG_ERROR, kTag, "no command process registered");
         }
@@ -124,7 +130,8 @@ bool read_client(Client &c, std::vector<char> &reply) {
             serve_line(c, line, overlong, reply);
         });
         if (!flush(c) || c.out.size() > kMaxPending) return false;
-        if (g_stop.load()) return true;
+        // A short read emptied the socket: poll again rather than ask for EAGAIN.
+        if (g_stop.load() || static_cast<size_t>(n) < sizeof(buf)) return true;
     }
 }
 

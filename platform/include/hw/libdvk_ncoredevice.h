@@ -67,8 +67,9 @@ int FTX_API_BatteryService_ChargingStatusSet(int enable);
 #define FTX_AT_LINE_MAX 4095
 
 /* Called for each command line (NUL-terminated, without its line end) on the thread that
- * runs runSelectLoopMode. reply is cleared before the call; whatever text the callback
- * leaves in it is sent back. Returns 0, 2 or 3, sent to the PC as the result. */
+ * runs runSelectLoopMode. reply starts empty (what earlier commands wrote is cleared);
+ * whatever text the callback leaves in it is sent back. Returns 0, 2 or 3, sent to the PC
+ * as the result. */
 typedef int (*FTX_AtCommandProcess_cb)(const char *cmdString, char *reply, unsigned int replySize);
 
 /* Opens the listening socket: TCP 127.0.0.1:$FTX_PC_PORT, else [pc] port of sim/device.ini
