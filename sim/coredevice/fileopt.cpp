@@ -180,11 +180,12 @@ int fileopt_read(const std::string &parm, char *reply, size_t size, size_t *leng
     } else if (!fileopt_confine(path, &host, &reason)) {
         ok = fail(reply, size, path, reason);
     } else {
-        int fd = open(host.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW);
+        // Non-blocking, so a FIFO cannot stall the channel; only regular files are read.
+        int fd = open(host.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK);
         struct stat st;
         if (fd < 0 && errno == ELOOP) {
             // A link inside the root: follow it, it was checked above.
-            fd = open(host.c_str(), O_RDONLY | O_CLOEXEC);
+            fd = open(host.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
         }
         if (fd < 0) {
             ok = fail(reply, size, path, strerror(errno));
@@ -223,7 +224,12 @@ int fileopt_write(const std::string &parm, char *reply, size_t size) {
             return fail(reply, size, path, reason);
         }
     }
-    int flags = O_WRONLY | O_CREAT | O_CLOEXEC | O_NOFOLLOW | (append ? O_APPEND : O_TRUNC);
+    struct stat st;
+    if (stat(host.c_str(), &st) == 0 && !S_ISREG(st.st_mode)) {
+        return fail(reply, size, path, "not a regular file");
+    }
+    int flags =
+        O_WRONLY | O_CREAT | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK | (append ? O_APPEND : O_TRUNC);
     int fd = open(host.c_str(), flags, 0644);
     if (fd < 0 && errno == ELOOP) {
         return fail(reply, size, path, "will not write through a symbolic link");

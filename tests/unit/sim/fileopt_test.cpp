@@ -1,4 +1,5 @@
 // The "FileOptMoudle" operations: formats, and that no parameter reaches outside the root.
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <filesystem>
@@ -77,6 +78,12 @@ TEST_F(FileOpt, BadInputIsAnsweredClearly) {
     root_.write("/etc/full/a", "1");
     EXPECT_EQ(remove("/etc/full", &ok).rfind("ERROR ", 0), 0u) << "a folder with files stays";
     EXPECT_EQ(read("/"), "ERROR not a file path");
+    // A FIFO would block the channel's only thread.
+    std::filesystem::create_directories(root_.host("/run"));
+    ASSERT_EQ(mkfifo(root_.host("/run/fifo").c_str(), 0600), 0);
+    EXPECT_EQ(read("/run/fifo"), "ERROR not a regular file");
+    EXPECT_EQ(write("/run/fifo,x"), "ERROR not a regular file");
+    EXPECT_EQ(read("/run"), "ERROR not a regular file");
     EXPECT_EQ(read(""), "ERROR path must be an absolute device path");
 }
 
