@@ -54,23 +54,31 @@ void copy_found(char *out, const char *value) {
     tp_os_strlcpy(out, value, strlen(value));
 }
 
-// What a line of the sectioned format is, seen from one lookup.
-enum class LineKind { Skip, Malformed, Entry };
-
-// Classifies one line; headers update domain. Entries are only reported inside a domain
-// that `wanted` begins with, split and trimmed into key and value.
-LineKind classify_line(const char *line, char *domain, const char *wanted, char *key, char *value) {
-    if (line[0] == '#') return LineKind::Skip;
-    if (line[0] == '[') {
-        return mmi_parse_domain(line, domain) == 0 ? LineKind::Skip : LineKind::Malformed;
+// Reads fp line by line and hands every entry with a non-empty key and value inside a
+// domain that `wanted` begins with to on_entry, split and trimmed, until it returns true.
+// -1 on a malformed header (logged for `who`), else 0.
+template <typename OnEntry>
+int scan_entries(FILE *fp, const char *wanted, const char *who, OnEntry on_entry) {
+    char line[FTX_CFG_LINE_SIZE] = {0};
+    char domain[FTX_CFG_TEXT_SIZE] = {0};
+    char key[FTX_CFG_TEXT_SIZE] = {0};
+    char value[FTX_CFG_TEXT_SIZE] = {0};
+    while (fgets(line, sizeof(line), fp) != nullptr) {
+        if (line[0] == '#') continue;
+        if (line[0] == '[') {
+            if (mmi_parse_domain(line, domain) == 0) continue;
+            CFG_DEBUG("%s mmi_parse_domain fail.", who);
+            return -1;
+        }
+        if (domain[0] == '\0' || !has_prefix(wanted, domain)) continue;
+        key[0] = '\0';
+        value[0] = '\0';
+        mmi_parse_equal(line, key, value);
+        trim_both(key);
+        trim_both(value);
+        if (key[0] != '\0' && value[0] != '\0' && on_entry(key, value)) break;
     }
-    if (domain[0] == '\0' || !has_prefix(wanted, domain)) return LineKind::Skip;
-    key[0] = '\0';
-    value[0] = '\0';
-    mmi_parse_equal(line, key, value);
-    trim_both(key);
-    trim_both(value);
-    return LineKind::Entry;
+    return 0;
 }
 
 }  // namespace
@@ -103,22 +111,12 @@ void mmi_parse_equal(const char *line, char *key_out, char *value_out) {
 
 int ftx_config_lookup_stream(FILE *fp, const char *domain, const char *key, char *out,
                              const char *def) {
-    char line[FTX_CFG_LINE_SIZE] = {0};
-    char curDomain[FTX_CFG_TEXT_SIZE] = {0};
-    char fileKey[FTX_CFG_TEXT_SIZE] = {0};
-    char fileValue[FTX_CFG_TEXT_SIZE] = {0};
-    while (fgets(line, sizeof(line), fp) != nullptr) {
-        LineKind kind = classify_line(line, curDomain, domain, fileKey, fileValue);
-        if (kind == LineKind::Malformed) {
-            CFG_DEBUG("%s mmi_parse_domain fail.", "Get_CfgValue");
-            return -1;
-        }
-        if (kind != LineKind::Entry) continue;
-        if (fileKey[0] != '\0' && fileValue[0] != '\0' && has_prefix(key, fileKey)) {
-            copy_found(out, fileValue);
-            break;
-        }
-    }
+    int rc = scan_entries(fp, domain, "Get_CfgValue", [&](const char *fileKey, const char *value) {
+        if (!has_prefix(key, fileKey)) return false;
+        copy_found(out, value);
+        return true;
+    });
+    if (rc != 0) return rc;
     // The default fills an empty buffer without a terminator of its own: the caller's
     // zeroed buffer ends it.
     if (out[0] == '\0' && def != nullptr) memcpy(out, def, strlen(def));
@@ -154,24 +152,15 @@ int Read_MainCfgFile(const char *domain, const char *key, char *out, const char 
 int ftx_config_load_lang_stream(FILE *fp, const char *language) {
     memset(s_langList, 0, sizeof(s_langList));
     s_langCount = 0;
-    char line[FTX_CFG_LINE_SIZE] = {0};
-    char curDomain[FTX_CFG_TEXT_SIZE] = {0};
-    char key[FTX_CFG_TEXT_SIZE] = {0};
-    char value[FTX_CFG_TEXT_SIZE] = {0};
-    while (fgets(line, sizeof(line), fp) != nullptr) {
-        LineKind kind = classify_line(line, curDomain, language, key, value);
-        if (kind == LineKind::Malformed) {
-            CFG_DEBUG("%s mmi_parse_domain fail.", "Get_CfgValueList");
-            return -1;
-        }
-        if (kind != LineKind::Entry || key[0] == '\0' || value[0] == '\0') continue;
+    return scan_entries(fp, language, "Get_CfgValueList", [](const char *key, const char *text) {
         // The last record stays empty: it ends every scan of the list.
-        if (s_langCount >= FTX_LANG_LIST_SIZE - 1) continue;
-        tp_os_strlcpy(s_langList[s_langCount].key, key, FTX_CFG_TEXT_SIZE);
-        tp_os_strlcpy(s_langList[s_langCount].text, value, FTX_CFG_TEXT_SIZE);
-        s_langCount++;
-    }
-    return 0;
+        if (s_langCount < FTX_LANG_LIST_SIZE - 1) {
+            tp_os_strlcpy(s_langList[s_langCount].key, key, FTX_CFG_TEXT_SIZE);
+            tp_os_strlcpy(s_langList[s_langCount].text, text, FTX_CFG_TEXT_SIZE);
+            s_langCount++;
+        }
+        return false;
+    });
 }
 
 int Get_CfgValueList(const char *language) {

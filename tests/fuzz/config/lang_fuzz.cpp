@@ -6,11 +6,6 @@
 #include "ftx_config.h"
 #include "tests/fuzz/config/fuzz_common.h"
 
-extern "C" int LLVMFuzzerInitialize(int *, char ***) {
-    fuzz_quiet_root();
-    return 0;
-}
-
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, size_t size) {
     std::string rest(reinterpret_cast<const char *>(data), size);
     std::string language = fuzz_take_line(rest, 255);
