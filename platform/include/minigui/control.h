@@ -1,0 +1,143 @@
+/* MiniGUI 3 controls of this library: "static" and "scrollview". */
+#ifndef FTX_MINIGUI_CONTROL_H
+#define FTX_MINIGUI_CONTROL_H
+
+#include "common.h"
+#include "gdi.h"
+#include "window.h"
+
+#ifdef __cplusplus
+extern "C" {
+#endif
+
+/* Static */
+#define CTRL_STATIC "static"
+#define SS_TYPEMASK 0x0000000FL
+#define SS_SIMPLE 0x00000000L
+#define SS_BLACKRECT 0x00000001L
+#define SS_GRAYRECT 0x00000002L
+#define SS_WHITERECT 0x00000003L
+#define SS_BLACKFRAME 0x00000004L
+#define SS_GRAYFRAME 0x00000005L
+#define SS_WHITEFRAME 0x00000006L
+#define SS_GROUPBOX 0x00000007L
+#define SS_ICON 0x00000008L
+#define SS_BITMAP 0x00000009L
+#define SS_OWNERDRAW 0x0000000AL
+#define SS_ENHMETAFILE 0x0000000BL
+#define SS_ALIGNMASK 0x000000F0L
+#define SS_LEFT 0x00000010L
+#define SS_CENTER 0x00000020L
+#define SS_RIGHT 0x00000030L
+#define SS_NOPREFIX 0x00000100L
+/* Also centres the text vertically on this host. */
+#define SS_CENTERIMAGE 0x00000200L
+#define SS_NOWORDWRAP 0x00000400L
+#define SS_LEFTNOWORDWRAP 0x00000400L
+#define SS_REALSIZEIMAGE 0x00000800L
+#define SS_NOTIFY 0x00001000L
+
+#define STM_SETICON 0xF170
+#define STM_GETICON 0xF171
+#define STM_SETIMAGE 0xF172
+#define STM_GETIMAGE 0xF173
+#define STM_MSGMAX 0xF174
+
+#define STN_DBLCLK 1
+#define STN_ENABLE 2
+#define STN_DISABLE 3
+#define STN_CLICKED 4
+
+/* Scroll view */
+#define CTRL_SCROLLVIEW "scrollview"
+#define CTRL_SCROLLWND "scrollwnd"
+typedef GHANDLE HSVITEM;
+
+#define SVS_UPNOTIFY 0x0001L
+#define SVS_NOTIFY 0x0002L
+#define SVS_AUTOSORT 0x0004L
+#define SVS_LOOP 0x0008L
+
+#define SVM_ADDITEM 0xF300
+#define SVM_DELITEM 0xF301
+#define SVM_SETITEMDRAW 0xF302
+#define SVM_ADDCTRLS 0xF303
+#define SVM_SETCONTWIDTH 0xF306
+#define SVM_SETCONTHEIGHT 0xF307
+#define SVM_GETCTRL 0xF308
+#define SVM_RESETCONTENT 0xF309
+#define SVM_SETITEMOPS 0xF30A
+#define SVM_GETMARGINS 0xF30B
+#define SVM_SETMARGINS 0xF311
+#define SVM_GETLEFTMARGIN 0xF312
+#define SVM_GETTOPMARGIN 0xF313
+#define SVM_GETRIGHTMARGIN 0xF314
+#define SVM_GETBOTTOMMARGIN 0xF315
+#define SVM_GETVISIBLEWIDTH 0xF316
+#define SVM_GETVISIBLEHEIGHT 0xF317
+#define SVM_GETCONTWIDTH 0xF318
+#define SVM_GETCONTHEIGHT 0xF319
+#define SVM_SETCONTRANGE 0xF31A
+#define SVM_GETCONTENTX 0xF31B
+#define SVM_GETCONTENTY 0xF31C
+#define SVM_SETCONTPOS 0xF31D
+#define SVM_GETCURSEL 0xF31E
+#define SVM_SELECTITEM 0xF31F
+#define SVM_SHOWITEM 0xF320
+#define SVM_CHOOSEITEM 0xF321
+#define SVM_SETCURSEL 0xF322
+#define SVM_SETITEMINIT 0xF323
+#define SVM_SETITEMDESTROY 0xF324
+#define SVM_SETITEMCMP 0xF327
+#define SVM_MAKEPOSVISIBLE 0xF328
+#define SVM_SETCONTAINERPROC 0xF329
+#define SVM_GETFOCUSCHILD 0xF32A
+#define SVM_GETHSCROLLVAL 0xF32B
+#define SVM_GETVSCROLLVAL 0xF32C
+#define SVM_GETHSCROLLPAGEVAL 0xF32D
+#define SVM_GETVSCROLLPAGEVAL 0xF32E
+#define SVM_SETSCROLLVAL 0xF32F
+#define SVM_SETSCROLLPAGEVAL 0xF330
+#define SVM_SORTITEMS 0xF331
+#define SVM_GETITEMCOUNT 0xF332
+#define SVM_GETITEMADDDATA 0xF333
+#define SVM_SETITEMADDDATA 0xF334
+#define SVM_REFRESHITEM 0xF335
+#define SVM_SETITEMHEIGHT 0xF336
+#define SVM_GETFIRSTVISIBLEITEM 0xF337
+
+#define SVN_CLICKED 1
+#define SVN_SELCHANGED 2
+#define SVN_SELCHANGING 4
+/* The handset's list reports an item chosen by Enter or a tap (add_data: the item). */
+#define SVN_ITEMCHOSEN 6
+
+typedef struct _SVITEMINFO {
+    int nItem;
+    int nItemHeight;
+    DWORD addData;
+} SVITEMINFO;
+typedef SVITEMINFO *PSVITEMINFO;
+
+typedef int (*SVITEM_INITFUNC)(HWND hWnd, HSVITEM hsvi);
+typedef void (*SVITEM_DESTROYFUNC)(HWND hWnd, HSVITEM hsvi);
+typedef void (*SVITEM_DRAWFUNC)(HWND hWnd, HSVITEM hsvi, HDC hdc, RECT *rcDraw);
+typedef int (*SVITEM_CMP)(HSVITEM hsvi1, HSVITEM hsvi2);
+
+typedef struct _SVITEMOPS {
+    SVITEM_INITFUNC initItem;
+    SVITEM_DESTROYFUNC destroyItem;
+    SVITEM_DRAWFUNC drawItem;
+} SVITEMOPS;
+typedef SVITEMOPS *PSVITEMOPS;
+
+MGUI_API DWORD scrollview_get_item_adddata(HSVITEM hsvi);
+MGUI_API int scrollview_get_item_index(HWND hWnd, HSVITEM hsvi);
+MGUI_API BOOL scrollview_is_item_hilight(HWND hWnd, HSVITEM hsvi);
+MGUI_API BOOL scrollview_is_item_selected(HSVITEM hsvi);
+MGUI_API int scrollview_set_item_height(HWND hWnd, HSVITEM hsvi, int height);
+
+#ifdef __cplusplus
+}
+#endif
+#endif
