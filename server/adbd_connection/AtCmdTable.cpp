@@ -1,0 +1,241 @@
+// The PC command table, in the order the station PCs expect (earlier rows are tried
+// first; of several prefix matches with empty actions the last wins). The module words'
+// misspellings are the protocol's.
+#include "AtCmdTable.h"
+
+#include <stdint.h>
+
+#include <android/log.h>
+
+#include "AutoTestHandlers.h"
+
+// A row whose handler arrives with its test; the name says which.
+#define PENDING(handler) nullptr
+
+const AtCmdRow g_atcmd_table[AT_CMD_TABLE_ROWS] = {
+    /*   1 */ {"vibratorMoudle testItem null", "", PENDING(AutoTest_Vibrator_Start)},
+    /*   2 */ {"vibratorMoudle testItem open", "", PENDING(AutoTest_Vibrator_Start)},
+    /*   3 */ {"vibratorMoudle testItem close", "", PENDING(AutoTest_Vibrator_Stop)},
+    /*   4 */ {"LCDMoudle testItem FFFFFF", "", PENDING(AutoTest_LCD_White_Start)},
+    /*   5 */ {"LCDMoudle testItem FF0000", "", PENDING(AutoTest_LCD_Red_Start)},
+    /*   6 */ {"LCDMoudle testItem 00FF00", "", PENDING(AutoTest_LCD_Green_Start)},
+    /*   7 */ {"LCDMoudle testItem 0000FF", "", PENDING(AutoTest_LCD_Blue_Start)},
+    /*   8 */ {"LCDMoudle testItem 000000", "", PENDING(AutoTest_LCD_Black_Start)},
+    /*   9 */ {"LCDMoudle testItem close", "", PENDING(AutoTest_LCD_Stop)},
+    /*  10 */ {"LCDMoudle testItem FFFFFF aux", "", PENDING(AutoTest_AUX_LCD_White_Start)},
+    /*  11 */ {"LCDMoudle testItem FF0000 aux", "", PENDING(AutoTest_AUX_LCD_Red_Start)},
+    /*  12 */ {"LCDMoudle testItem 00FF00 aux", "", PENDING(AutoTest_AUX_LCD_Green_Start)},
+    /*  13 */ {"LCDMoudle testItem 0000FF aux", "", PENDING(AutoTest_AUX_LCD_Blue_Start)},
+    /*  14 */ {"LCDMoudle testItem 000000 aux", "", PENDING(AutoTest_AUX_LCD_Black_Start)},
+    /*  15 */ {"LCDMoudle testItem close aux", "", PENDING(AutoTest_AUX_LCD_Stop)},
+    /*  16 */ {"LEDMoudle testItem FF0000", "", PENDING(AutoTest_LED_Red_Start)},
+    /*  17 */ {"LEDMoudle testItem 00FF00", "", PENDING(AutoTest_LED_Green_Start)},
+    /*  18 */ {"LEDMoudle testItem FFFF00", "", PENDING(AutoTest_LED_Orange_Start)},
+    /*  19 */ {"LEDMoudle testItem close", "", PENDING(AutoTest_LED_Stop)},
+    /*  20 */ {"LCDbacklightMoudle testItem", "", PENDING(AutoTest_LCDBacklight_Start)},
+    /*  21 */ {"LCDbacklightTestMoudle testItem close", " ", PENDING(AutoTest_LCDBacklight_Stop)},
+    /*  22 */ {"LCDWakeupMoudle testItem", "", PENDING(AutoTest_LCD_Wakeup)},
+    /*  23 */ {"LCDTurnoffMoudle testItem", " ", AutoTest_LCD_Turnoff},
+    /*  24 */ {"KEYbacklightMoudle testItem open", "", PENDING(AutoTest_KEYBacklight_Start)},
+    /*  25 */ {"KEYbacklightMoudle testItem close", "", PENDING(AutoTest_KEYBacklight_Stop)},
+    /*  26 */ {"flashlightMoudle testItem open", "", PENDING(AutoTest_flashlight_Start)},
+    /*  27 */ {"flashlightMoudle testItem close", "", PENDING(AutoTest_flashlight_Stop)},
+    /*  28 */ {"flashlightMoudle2 testItem open", "", PENDING(AutoTest_flashlight2_Start)},
+    /*  29 */ {"flashlightMoudle2 testItem close", "", PENDING(AutoTest_flashlight2_Stop)},
+    /*  30 */
+    {"flashlightMoudle testItem front open", "", PENDING(AutoTest_flashlight_front_Start)},
+    /*  31 */
+    {"flashlightMoudle testItem front close", "", PENDING(AutoTest_flashlight_front_Stop)},
+    /*  32 */ {"keyboardMoudle testItem open", "", PENDING(AutoTest_keyboard_Start)},
+    /*  33 */ {"keyboardMoudle testItem close", "", PENDING(AutoTest_keyboard_Stop)},
+    /*  34 */ {"headsethookMoudle testItem open", "", PENDING(AutoTest_headsethook_Start)},
+    /*  35 */ {"headsethookMoudle testItem close", "", PENDING(AutoTest_headsethook_Stop)},
+    /*  36 */ {"touchMoudle testItem open", "", PENDING(AutoTest_touchscreen_Start)},
+    /*  37 */ {"touchMoudle testItem close", "", PENDING(AutoTest_touchscreen_Stop)},
+    /*  38 */ {"FMMoudle testItem", "", PENDING(AutoTest_FM_Start)},
+    /*  39 */ {"FMMoudle testItem", "close", PENDING(AutoTest_FM_Stop)},
+    /*  40 */
+    {"audioMoudle testItem HeadsetHeadset", "", PENDING(AutoTest_audioloop_HeadsetHeadset_Start)},
+    /*  41 */
+    {"audioMoudle testItem HeadsetSpeaker", "", PENDING(AutoTest_audioloop_HeadsetSpeaker_Start)},
+    /*  42 */
+    {"audioMoudle testItem HeadsetReceiver", "", PENDING(AutoTest_audioloop_HeadsetReceiver_Start)},
+    /*  43 */
+    {"audioMoudle testItem MicroHeadset", "", PENDING(AutoTest_audioloop_MicroHeadset_Start)},
+    /*  44 */
+    {"audioMoudle testItem AuxiliaryMicroHeadset1", "",
+     PENDING(AutoTest_audioloop_AuxiliaryMicroHeadset1_Start)},
+    /*  45 */
+    {"audioMoudle testItem AuxiliaryMicroHeadset2", "",
+     PENDING(AutoTest_audioloop_AuxiliaryMicroHeadset2_Start)},
+    /*  46 */
+    {"audioMoudle testItem openMicro", "", PENDING(AutoTest_audioloop_MainMicRecord_Start)},
+    /*  47 */
+    {"audioMoudle testItem MicroSpeaker", "", PENDING(AutoTest_audioloop_MainMic_Speaker_Start)},
+    /*  48 */
+    {"audioMoudle testItem openSpeaker", "", PENDING(AutoTest_Audio_SpeakerRingtone_Start)},
+    /*  49 */ {"audioMoudle testItem close", "", PENDING(AutoTest_audioloop_Stop)},
+    /*  50 */ {"frontcameraMoudle testItem open", "", PENDING(AutoTest_frontcamera_Start)},
+    /*  51 */ {"frontcameraMoudle testItem snapshot", "", PENDING(AutoTest_frontcamera_Snapshot)},
+    /*  52 */ {"frontcameraMoudle testItem close", "", PENDING(AutoTest_frontcamera_Stop)},
+    /*  53 */ {"backcameraMoudle testItem open", "", PENDING(AutoTest_backcamera_Start)},
+    /*  54 */ {"backcameraMoudle testItem snapshot", "", PENDING(AutoTest_backcamera_Snapshot)},
+    /*  55 */ {"backcameraMoudle testItem close", "", PENDING(AutoTest_backcamera_Stop)},
+    /*  56 */ {"auxbackcameraMoudle testItem open", "", PENDING(AutoTest_auxbackcamera_Start)},
+    /*  57 */
+    {"auxbackcameraMoudle testItem snapshot", "", PENDING(AutoTest_auxbackcamera_Snapshot)},
+    /*  58 */ {"auxbackcameraMoudle testItem close", "", PENDING(AutoTest_auxbackcamera_Stop)},
+    /*  59 */ {"sensorMoudle testItem open", "", PENDING(AutoTest_sensor_Start)},
+    /*  60 */ {"sensorMoudle testItem calibrate", "", PENDING(AutoTest_sensor_Calibrate)},
+    /*  61 */ {"sensorMoudle testItem close", "", PENDING(AutoTest_sensor_Stop)},
+    /*  62 */ {"sensorMoudle testItem readAcc", "", PENDING(AutoTest_Acc_sensor_Start)},
+    /*  63 */ {"sensorMoudle testItem readMag", "", PENDING(AutoTest_Mag_sensor_Start)},
+    /*  64 */ {"sensorMoudle testItem readGyro", "", PENDING(AutoTest_Gyro_sensor_Start)},
+    /*  65 */ {"sensorMoudle testItem readPressure", "", PENDING(AutoTest_Pressure_sensor_Start)},
+    /*  66 */ {"sensorMoudle testItem readHeartrate", "", PENDING(AutoTest_Heartrate_sensor_Start)},
+    /*  67 */ {"sensorMoudle testItem readProxi", "", PENDING(AutotestSensorProxiStart)},
+    /*  68 */ {"sensorMoudle testItem readLight", "", PENDING(AutotestSensorLightStart)},
+    /*  69 */
+    {"sensorMoudle testItem heartrateSelfTest", "",
+     PENDING(AutoTest_HeartrateSelfTest_sensor_Start)},
+    /*  70 */ {"hallsensorMoudle testItem open", "", PENDING(AutoTest_hallsensor_Start)},
+    /*  71 */ {"hallsensorMoudle testItem close", "", PENDING(AutoTest_hallsensor_Stop)},
+    /*  72 */ {"flashtypeMoudle testItem read", "", PENDING(AutoTest_flashtype_Read)},
+    /*  73 */ {"RAMMoudle testItem read", "", PENDING(AutoTest_RAM_Read)},
+    /*  74 */ {"ROMMoudle testItem read", "", PENDING(AutoTest_ROM_Read)},
+    /*  75 */ {"simMoudle testItem", "", PENDING(AutoTest_sim_Read)},
+    /*  76 */ {"sdCardMoudle testItem", "", PENDING(AutoTest_SDCard_Read)},
+    /*  77 */ {"batteryMoudle testItem charging", "", PENDING(AutoTest_battery_charging_Read)},
+    /*  78 */ {"batteryMoudle testItem chargeing", "", PENDING(AutoTest_battery_charging_Read)},
+    /*  79 */ {"batteryMoudle testItem power", "", PENDING(AutoTest_battery_power_Read)},
+    /*  80 */
+    {"batteryMoudle testItem temperature", "", PENDING(AutoTest_battery_temperature_Read)},
+    /*  81 */ {"batteryMoudle testItem health", "", PENDING(AutoTest_battery_health_Read)},
+    /*  82 */ {"barcodeMoudle testItem read", "", PENDING(AutoTest_barcode_Read)},
+    /*  83 */ {"IMEIMoudle testItem read", "", PENDING(AutoTest_IMEI_Read)},
+    /*  84 */ {"softwareMoudle testItem internal", "", PENDING(AutoTest_internalsoftware_Read)},
+    /*  85 */ {"softwareMoudle testItem external", "", PENDING(AutoTest_externalsoftware_Read)},
+    /*  86 */ {"hardwareMoudle testItem read", "", PENDING(AutoTest_haredware_Read)},
+    /*  87 */ {"testinfoMoudle testItem", "", AutoTest_testinfo},
+    /*  88 */ {"usbChargeMoudle testItem open", "", PENDING(AutoTest_BatteryCharge_Enable)},
+    /*  89 */ {"usbChargeMoudle testItem close", "", PENDING(AutoTest_BatteryCharge_Disable)},
+    /*  90 */ {"nfcMoudle testItem open", "", PENDING(AutoTest_NfcTest_Enable)},
+    /*  91 */ {"nfcMoudle testItem close", "", PENDING(AutoTest_NfcTest_Disable)},
+    /*  92 */ {"fingerprintMoudle testItem open", "", PENDING(AutoTest_Fingerprint_Start)},
+    /*  93 */ {"fingerprintMoudle testItem close", "", PENDING(AutoTest_Fingerprint_Stop)},
+    /*  94 */ {"standbyMoudle testItem open", "", PENDING(AutoTest_Standby_Enable)},
+    /*  95 */ {"standbyMoudle testItem close", "", PENDING(AutoTest_Standby_Disable)},
+    /*  96 */ {"WiFiMoudle testItem open", "", PENDING(AutoTest_WiFi_Enable)},
+    /*  97 */ {"WiFiMoudle testItem close", "", PENDING(AutoTest_WiFi_Disable)},
+    /*  98 */ {"WiFiConCptMoudle testItem open", "", AutoTest_WiFiConCpt_Enable},
+    /*  99 */ {"WiFiConCptMoudle testItem close", "", AutoTest_WiFiConCpt_Disable},
+    /* 100 */ {"mmiMoudle testItem open", "", PENDING(AutoTest_MMI_Enable)},
+    /* 101 */ {"mmiMoudle testItem close", "", PENDING(AutoTest_MMI_Disable)},
+    /* 102 */ {"FileOptMoudle testItem read", "", AutoTest_FileOpt_Read},
+    /* 103 */ {"FileOptMoudle testItem write", "", AutoTest_FileOpt_Write},
+    /* 104 */ {"FileOptMoudle testItem remove", "", AutoTest_FileOpt_Remove},
+    /* 105 */ {"forcetouchMoudle testItem open", "", PENDING(automated_force_touch_test_start)},
+    /* 106 */ {"forcetouchMoudle testItem close", "", PENDING(automated_force_touch_test_stop)},
+    /* 107 */
+    {"forcetouchcalibrationMoudle testItem open", "",
+     PENDING(automated_force_touch_calibration_start)},
+    /* 108 */
+    {"forcetouchcalibrationMoudle testItem close", "",
+     PENDING(automated_force_touch_calibration_stop)},
+    /* 109 */
+    {"forcetouchcalibrationMoudle testItem read", "",
+     PENDING(automated_force_touch_calibration_read)},
+    /* 110 */
+    {"forcetouchcomprehensiveMoudle testItem open", "",
+     PENDING(automated_force_touch_comprehensive_test_start)},
+    /* 111 */
+    {"forcetouchcomprehensiveMoudle testItem close", "",
+     PENDING(automated_force_touch_comprehensive_test_stop)},
+    /* 112 */
+    {"forcetouchcomprehensiveMoudle testItem read", "",
+     PENDING(automated_force_touch_calibration_read)},
+    /* 113 */ {"VibratorPCBA testItem start", "", PENDING(PCBAAutotestVibratorStart)},
+    /* 114 */ {"VibratorPCBA testItem stop", "", PENDING(PCBAAutotestVibratorEnd)},
+    /* 115 */ {"CpuPCBA testItem start", "", PENDING(PCBAAutotestCpuStart)},
+    /* 116 */ {"CpuPCBA testItem stop", "", PENDING(PCBAAutotestCpuStop)},
+    /* 117 */ {"MemoryPCBA testItem start", "", PENDING(PCBAAutotestMemoryStart)},
+    /* 118 */ {"MemoryPCBA testItem stop", "", PENDING(PCBAAutotestMemoryStop)},
+    /* 119 */ {"BluetoothPCBA testItem start", "", PENDING(PCBAAutotestBluetoothStart)},
+    /* 120 */ {"BluetoothPCBA testItem stop", "", PENDING(PCBAAutotestBluetoothStop)},
+    /* 121 */ {"CameraBackPCBA testItem start", "", PENDING(PCBAAutotestCameraBackStart)},
+    /* 122 */ {"CameraFrontPCBA testItem start", "", PENDING(PCBAAutotestCameraFrontStart)},
+    /* 123 */ {"BatteryPCBA testItem start", "", PENDING(PCBAAutotestBatteryStart)},
+    /* 124 */ {"BatteryPCBA testItem stop", "", PENDING(PCBAAutotestBatteryStop)},
+    /* 125 */ {"WifiPCBA testItem start", "", PENDING(PCBAAutotestWifiStart)},
+    /* 126 */ {"WifiPCBA testItem stop", "", PENDING(PCBAAutotestWifiStop)},
+    /* 127 */ {"FmPCBA testItem start", "", PENDING(PCBAAutotestFmStart)},
+    /* 128 */ {"FmPCBA testItem stop", "", PENDING(PCBAAutotestFmStop)},
+    /* 129 */ {"GpsPCBA testItem start", "", PENDING(PCBAAutotestGpsStart)},
+    /* 130 */ {"GpsPCBA testItem stop", "", PENDING(PCBAAutotestGpsStop)},
+    /* 131 */ {"TouchPCBA testItem start", "", PENDING(PCBAAutotestTouchStart)},
+    /* 132 */ {"TouchPCBA testItem stop", "", PENDING(PCBAAutotestTouchStop)},
+    /* 133 */ {"StoragePCBA testItem start", "", PENDING(PCBAAutotestStorageStart)},
+    /* 134 */ {"StoragePCBA testItem stop", "", PENDING(PCBAAutotestStorageStop)},
+    /* 135 */ {"SdcardPCBA testItem start", "", PENDING(PCBAAutotestSdcardStart)},
+    /* 136 */ {"SdcardPCBA testItem stop", "", PENDING(PCBAAutotestSdcardStop)},
+    /* 137 */ {"SimPCBA testItem start", "", PENDING(PCBAAutotestSimStart)},
+    /* 138 */ {"SimPCBA testItem stop", "", PENDING(PCBAAutotestSimStop)},
+    /* 139 */ {"KeyPCBA testItem start", "", PENDING(PCBAAutotestKeyStart)},
+    /* 140 */ {"KeyPCBA testItem stop", "", PENDING(PCBAAutotestKeyStop)},
+    /* 141 */ {"RingPCBA testItem start", "", PENDING(PCBAAutotestRingStart)},
+    /* 142 */ {"RingPCBA testItem stop", "", PENDING(PCBAAutotestRingStop)},
+    /* 143 */ {"WgbPCBA testItem start", "", PENDING(PCBAAutotestWgbStart)},
+    /* 144 */ {"WgbPCBA testItem stop", "", PENDING(PCBAAutotestWgbStop)},
+    /* 145 */ {"LightControl testItem Open", "", PENDING(AutoTest_LightControl_Open)},
+    /* 146 */ {"LightControl testItem Close", "", PENDING(AutoTest_LightControl_Close)},
+    /* 147 */ {"SwitchSSID testItem", "", PENDING(AutoTest_SwitchSSID)},
+    /* 148 */ {"ConfigMoudle testItem write", "", PENDING(AutoTest_Modify_ConfigFile)},
+    /* 149 */ {"RSSIMoudle testItem read", "", PENDING(AutoTest_GetWiFiRSSI)},
+    /* 150 */ {"APInfoMoudle testItem read", "", PENDING(AutoTest_GetAPInfo)},
+    /* 151 */ {"PowerOffMoudle testItem close", "", PENDING(AutoTest_PowerOff)},
+    /* 152 */ {"EnterLowCostMode testItem", "", AutoTest_EnterLowCostMode},
+    /* 153 */ {"RebootMoudle testItem close", "", PENDING(AutoTest_Reboot)},
+    /* 154 */ {"audioMoudle testItem HiFi", "", PENDING(AutoTest_hifi_Start)},
+    /* 155 */ {"hifiaudioMoudle testItem close", "", PENDING(AutoTest_hifi_Stop)},
+    /* 156 */ {"audioMoudle testItem HeadsetRecSpeaker", "", PENDING(AutoTestMicToSpeakerStart)},
+    /* 157 */ {"Mic2Earpiece testItem start", "", PENDING(AutotestMic2EarpieceStart)},
+    /* 158 */ {"Mic2Earpiece testItem stop", "", PENDING(AutotestMic2EarpieceStop)},
+    /* 159 */ {"AuxMic2Earpiece testItem start", "", PENDING(AutotestAuxMic2EarpieceStart)},
+    /* 160 */ {"AuxMic2Earpiece testItem stop", "", PENDING(AutotestAuxMic2EarpieceStop)},
+    /* 161 */ {"ReadCameraID testItem start", "", PENDING(AutotestReadCameraIDStart)},
+    /* 162 */ {"CloseDialog testItem start", "", PENDING(AutoCloseDialog)},
+    /* 163 */ {"audioRingMoudle testItem open", "", PENDING(AutoTest_Ring_Start)},
+    /* 164 */ {"audioRingMoudle testItem close", "", PENDING(AutoTest_Ring_Stop)},
+    /* 165 */
+    {"SpeakerCalibrateMoudle testItem open", "", PENDING(AutoTest_SpeakerCalibrate_Start)},
+    /* 166 */
+    {"SpeakerCalibrateMoudle testItem calibrate", "", PENDING(AutoTest_SpeakerCalibrate_Calibrate)},
+    /* 167 */
+    {"SpeakerCalibrateMoudle testItem close", "", PENDING(AutoTest_SpeakerCalibrate_Stop)},
+    /* 168 */ {"HueMoudle testItem set", "", PENDING(AutoTest_DualLCD_Hue_Set)},
+    /* 169 */ {"HueRegMoudle testItem set", "", PENDING(AutoTest_DualLCD_Hue_Register_Set)},
+    /* 170 */ {"GrayLevelMoudle testItem set", "", PENDING(AutoTest_DualLCD_GrayLevel_Set)},
+    /* 171 */ {"DualLCDMoudle testItem Switch", "", PENDING(AutoTest_DualLCD_Switch_Display)},
+    /* 172 */ {"CABCMoudle testItem open", "", AutoTest_CABC_Open},
+    /* 173 */ {"CABCMoudle testItem close", "", AutoTest_CABC_Close},
+    /* 174 */ {"LCDType testItem read", "", PENDING(AutoTest_LCDType_Read)},
+    /* 175 */ {"WiFiUDPServ testItem open", "", PENDING(WiFiUDPServ_Enable)},
+    /* 176 */ {"WiFiUDPServ testItem close", "", PENDING(WiFiUDPServ_Disable)},
+    /* 177 */ {"WiFiDataRate testItem set", "", WiFiDataRate_set},
+    /* 178 */ {"commonModule testItem showImage", "", PENDING(PixelWorks_Calibrate_ShowPicture)},
+    /* 179 */ {"commonModule testItem close", "", PENDING(PixelWorks_Calibrate_ShowPicture_Close)},
+};
+
+int register_at_procs(void) {
+    // The row counter is 8 bits wide, as on the handset: the table holds at most 255 rows.
+    static_assert(AT_CMD_TABLE_ROWS <= 255, "command table too long");
+    for (uint8_t i = 0; i < AT_CMD_TABLE_ROWS; i++) {
+        const AtCmdRow &r = g_atcmd_table[i];
+        if (registerModule(r.cmd, r.action, r.fun, 1) != REGISTER_OK) {
+            __android_log_print(ANDROID_LOG_ERROR, "AtThread", "%s::register_at_procs fail",
+                                "AtThreadStart");
+            return -1;
+        }
+    }
+    return 0;
+}

@@ -1,0 +1,3 @@
+#include "mmi_runstate.h"
+
+std::atomic<int> g_bAutoTestRunning{0};
