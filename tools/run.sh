@@ -1,0 +1,85 @@
+#!/usr/bin/env bash
+# Starts the factory application on the simulated handset (./ftx run).
+# Usage: ./ftx run [--headless] [--root DIR] [--fresh] [--screen WxH]
+# Prepares the device root from sim/image when it is missing (--fresh makes it anew),
+# restarts the application when it asks for a reboot (exit status 101) and stops on a
+# power-off (100), on Ctrl-C or on any other end.
+set -uo pipefail
+
+TOP="${FTX_TOP:?run through ./ftx run}"
+BUILD="${FTX_BUILD_DIR:-$TOP/build}"
+ROOT="$TOP/root"
+FRESH=0
+SCREEN=""
+HEADLESS=0
+
+say() { printf 'ftx run: %s\n' "$*" >&2; }
+
+while [ $# -gt 0 ]; do
+  case "$1" in
+    --headless) HEADLESS=1 ;;
+    --fresh) FRESH=1 ;;
+    --root) shift; ROOT="${1:?--root needs a folder}" ;;
+    --root=*) ROOT="${1#--root=}" ;;
+    --screen) shift; SCREEN="${1:?--screen needs WxH}" ;;
+    --screen=*) SCREEN="${1#--screen=}" ;;
+    -h|--help) sed -n '2,5p' "$0"; exit 0 ;;
+    *) say "unknown option: $1"; exit 2 ;;
+  esac
+  shift
+done
+
+if [ -n "$SCREEN" ] && ! [[ "$SCREEN" =~ ^[0-9]+x[0-9]+$ ]]; then
+  say "--screen wants WxH, e.g. 720x1280"; exit 2
+fi
+[ -x "$BUILD/bin/ftx-mmi" ] || { say "no $BUILD/bin/ftx-mmi: build first (./ftx build)"; exit 1; }
+
+ROOT="$(mkdir -p "$(dirname "$ROOT")" && cd "$(dirname "$ROOT")" && pwd)/$(basename "$ROOT")"
+if [ "$FRESH" = 1 ] && [ -d "$ROOT" ]; then
+  say "recreating $ROOT"
+  rm -rf -- "$ROOT"
+fi
+if [ ! -d "$ROOT/etc" ]; then
+  say "preparing the device root $ROOT from sim/image"
+  mkdir -p "$ROOT"
+  cp -a "$TOP/sim/image/." "$ROOT/"
+fi
+mkdir -p "$ROOT/log" "$ROOT/run"
+
+export FTX_ROOT="$ROOT"
+export LD_LIBRARY_PATH="$BUILD/lib${LD_LIBRARY_PATH:+:$LD_LIBRARY_PATH}"
+[ -n "$SCREEN" ] && export FTX_SCREEN="$SCREEN"
+if [ "$HEADLESS" = 1 ]; then
+  export FTX_DISPLAY=headless
+elif [ -z "${FTX_DISPLAY:-}" ] && [ -z "${DISPLAY:-}" ] && [ -z "${WAYLAND_DISPLAY:-}" ]; then
+  say "no display found: running headless"
+  export FTX_DISPLAY=headless
+fi
+
+PORT="${FTX_PC_PORT:-$(sed -n '/^\[pc\]/,/^\[/s/^port=//p' "$ROOT/sim/device.ini" | head -n1)}"
+PORT="${PORT:-20051}"
+export FTX_PC_PORT="$PORT"
+
+CHILD=0
+stop() {
+  [ "$CHILD" != 0 ] && kill -TERM "$CHILD" 2>/dev/null && wait "$CHILD" 2>/dev/null
+  say "stopped"
+  exit 130
+}
+trap stop INT TERM
+
+while :; do
+  say "PC port: 127.0.0.1:$PORT   (./ftx pc COMMAND)"
+  say "console: $ROOT/run/console.sock   (./ftx console -s $ROOT/run/console.sock LINE)"
+  say "log:     $ROOT/log/logcat.txt"
+  "$BUILD/bin/ftx-mmi" &
+  CHILD=$!
+  wait "$CHILD"
+  STATUS=$?
+  CHILD=0
+  case "$STATUS" in
+    101) say "reboot requested: starting again" ;;
+    100) say "powered off"; exit 0 ;;
+    *) say "ftx-mmi ended with status $STATUS"; exit "$STATUS" ;;
+  esac
+done
