@@ -83,8 +83,6 @@ PENDING_STOP(mmi_testwnd_Audio_Headset_Receiver_Stop_Entry, "FTX_AUDIO_HEADSET_R
 PENDING_ENTRY(mmi_testwnd_Audio_Headset_Speaker_LoopBackTestEntry,
               "FTX_AUDIO_HEADSET_SPEAKER_LOOPBACK")
 PENDING_STOP(mmi_testwnd_Audio_Headset_Speaker_Stop_Entry, "FTX_AUDIO_HEADSET_SPEAKER_LOOPBACK")
-PENDING_ENTRY(mmi_testwnd_VibratorTestEntry, "FTX_VIBRATOR")
-PENDING_STOP(mmi_testwnd_VibratorTest_Stop_Entry, "FTX_VIBRATOR")
 PENDING_ENTRY(mmi_testwnd_sar_start, "FTX_SAR")
 PENDING_STOP(mmi_testwnd_sar_stop, "FTX_SAR")
 PENDING_ENTRY(mmi_testwnd_Auxiliarysar_start, "FTX_AuxiliarySAR")

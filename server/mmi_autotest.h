@@ -1,0 +1,61 @@
+// The automatic test sequence: the full run, the two pretest runs, the next-item rule and
+// the restore files that let a run cut short by a reboot resume after its last pass.
+#pragma once
+
+#include <atomic>
+
+#include "mmi_testitem.h"
+
+// g_autoTestMode values.
+#define AUTOTEST_MODE_FULL 0
+#define AUTOTEST_MODE_PRETEST1 1
+#define AUTOTEST_MODE_PRETEST2 3
+
+// Summary items of the result record.
+#define AUTOTEST_ITEM_CAC_PREVIEW 64
+#define AUTOTEST_ITEM_CAC_PREVIEW_TEMP 66
+
+#define AUTOTEST_LATEST_PASS_FILE "/data/pv_autotest_latest_pass"
+#define AUTOTEST_RESTORE_FLAG_FILE "/data/pv_autotest_restore_flag"
+#define AUTOTEST_AUX_LCD_FLAG_FILE "/data/pv_aux_lcd_test_flag"
+#define AUTOTEST_FB0_BLACK_FLAG_FILE "/data/fb0_black_flag"
+#define AUTOTEST_TS_MAIN_CTRL_FILE "/proc/touchscreen/ts_main_ctrl"
+
+extern std::atomic<int> g_autoTestMode;
+
+// What the sequence reaches outside itself; tests replace it.
+struct mmi_autotest_ops {
+    int (*write_result)(int item, int result);  // the result record
+    int (*read_flags)(unsigned char *flags);    // whole flag area; -1 when unbound
+    int (*read_config)(const char *domain, const char *key, char *out, const char *def);
+    int (*modify_config)(const char *parm);  // "DOMAIN,key,value"
+    int (*build_list)(int reset);
+    int (*build_aux_list)(int reset);
+    int (*open_device_list)(void);
+    int (*device_list_is_open)(void);
+    void (*refresh_device_list)(void);
+    int (*lcd_off)(void);
+    void (*exit_process)(int status);
+    void (*sleep_us)(unsigned long us);
+};
+extern mmi_autotest_ops g_autotestOps;
+mmi_autotest_ops mmi_autotest_default_ops(void);
+
+// The selection rules over a list, without side effects.
+// First item a run of `mode` opens; null when none.
+const testitem_node *mmi_autotest_first_item(const testitem_node *head, int mode, int mmiPreFlag);
+// The node whose config_domain is a prefix of domain; null when none.
+const testitem_node *mmi_autotest_find_item(const testitem_node *head, const char *domain);
+// The item after current that a run of `mode` opens next; null at the end of the list.
+const testitem_node *mmi_autotest_next_item(const testitem_node *current, int mode, int mmiPreFlag);
+
+int mmi_AutoTestEntry(void);
+int mmi_AutoTestEntry_Ex(void);
+int mmi_AutoTestEntry_Ex2(void);
+// Called by a test window after a pass in a run, with its own domain.
+int mmi_startNextItemTest(const char *domain);
+
+// Rewrites one key of the main configuration: parm is "DOMAIN,key,value". 1 on success.
+int mmi_AutoTest_Modify_ConfigFile(const char *parm);
+// Makes the system partition (which holds /etc) writable. 0 on success.
+int remount_system_partition(void);

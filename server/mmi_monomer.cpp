@@ -1,0 +1,39 @@
+// The monomer preview sequence.
+#include "mmi_monomer.h"
+
+#include <android/log.h>
+
+#include "mmi_autotest.h"
+#include "mmi_testitem.h"
+
+#define MP_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_MAIN", __VA_ARGS__)
+
+std::atomic<int> g_bMonomerPreviewRunning{0};
+
+int mmi_testwnd_MonomerPreview_Entry(void) {
+    MP_DEBUG("%s begin.", __func__);
+    Get_MonomerPreviewTestItem_Config();
+    const testitem_node *first = g_pMonomerPreviewListHead;
+    if (!first) {
+        MP_DEBUG("%s error: no preview item enabled", __func__);
+        return -1;
+    }
+    g_bMonomerPreviewRunning = 1;
+    if (first->entry) first->entry();
+    return 0;
+}
+
+int mmi_startNextMonomerPreviewItemTest(const char *domain) {
+    MP_DEBUG("%s begin.chdomain = %s", __func__, domain ? domain : "");
+    if (g_bMonomerPreviewRunning != 1 || !domain) return 1;
+    const testitem_node *current = mmi_autotest_find_item(g_pMonomerPreviewListHead, domain);
+    // Every enabled item of the preview list takes part.
+    const testitem_node *next = current ? current->pNodeNext : nullptr;
+    if (next) {
+        if (next->entry) next->entry();
+        return 0;
+    }
+    MP_DEBUG("%s preview done", __func__);
+    g_bMonomerPreviewRunning = 0;
+    return 1;
+}
