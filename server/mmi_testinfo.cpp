@@ -10,6 +10,8 @@
 
 #include <android/log.h>
 
+#include "mmi_loglevel.h"
+
 #include "devfs.h"
 #include "ftx_lib_binding.h"
 #include "mmi_runstate.h"
@@ -60,9 +62,8 @@ void check_written(const unsigned char *work, bool writes) {
     read_area(back);
     int b = s_byteIndex;
     if (work[b] == back[b]) return;
-    __android_log_print(ANDROID_LOG_DEBUG, kTag,
-                        "%s::check testinfo indexbyte=%d,writeval=%d,readval=%d", kWriteName, b,
-                        work[b], back[b]);
+    MMI_LOGD(kTag, "%s::check testinfo indexbyte=%d,writeval=%d,readval=%d", kWriteName, b, work[b],
+             back[b]);
     if (writes) write_byte(b, work[b]);
 }
 
@@ -77,8 +78,7 @@ int GetSign(const unsigned char *flags, int item) {
 
 int SetSignInOneByte(unsigned char *byte, int slot, int value) {
     int high = high_bit(slot);
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::m_highPower=%d,m_lowPower=%d",
-                        "SetPowerValue", high, high - 1);
+    MMI_LOGD(kTag, "%s::m_highPower=%d,m_lowPower=%d", "SetPowerValue", high, high - 1);
     if (value < 0 || value > 2 || slot < 0 || slot > 3 || byte == nullptr) return 0;
     *byte =
         static_cast<unsigned char>((*byte & ~(3u << (high - 1))) | (unsigned)value << (high - 1));
@@ -98,8 +98,7 @@ void mmi_testinfo_current(int *byteIndex, int *slot) {
 
 int mmi_write_testinfo_single_byte(int item, int result) {
     std::lock_guard<std::mutex> lock(s_writeLock);
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s,itemindex=%d,testresult=%d", kWriteName, item,
-                        result);
+    MMI_LOGD(kTag, "%s,itemindex=%d,testresult=%d", kWriteName, item, result);
     if (item < 0 || item >= MMI_TESTINFO_ITEMS) {
         __android_log_print(ANDROID_LOG_ERROR, kTag, "%s::item %d out of range", kWriteName, item);
         return 0;
@@ -119,11 +118,9 @@ int mmi_write_testinfo_single_byte(int item, int result) {
         s_slot = item % 4;
         SetSignInOneByte(&work[item / 4], item % 4, result);
     }
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::ftx_api_WriteFuncTestInfoFlags begin",
-                        kWriteName);
+    MMI_LOGD(kTag, "%s::ftx_api_WriteFuncTestInfoFlags begin", kWriteName);
     if (writes) write_byte(item / 4, work[item / 4]);
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::ftx_api_WriteFuncTestInfoFlags end",
-                        kWriteName);
+    MMI_LOGD(kTag, "%s::ftx_api_WriteFuncTestInfoFlags end", kWriteName);
 
     check_written(work, writes);
     decode_all(work);
@@ -134,14 +131,12 @@ int mmi_write_testinfo_single_byte(int item, int result) {
         s_byteIndex = kCacByte;
         s_slot = MMI_ITEM_CAC_PREVIEW % 4;
         SetSignInOneByte(&work[kCacByte], MMI_ITEM_CAC_PREVIEW % 4, MMI_RESULT_FAIL);
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::g_pretestMenuEnabled=%d", kWriteName,
-                            g_pretestMenuEnabled.load());
+        MMI_LOGD(kTag, "%s::g_pretestMenuEnabled=%d", kWriteName, g_pretestMenuEnabled.load());
         if (g_pretestMenuEnabled == 1)
             SetSignInOneByte(&work[kCacByte], MMI_ITEM_CAC_PREVIEW_TEMP % 4, MMI_RESULT_FAIL);
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::write cac_preview testresult=%d begin",
-                            kWriteName, MMI_RESULT_FAIL);
+        MMI_LOGD(kTag, "%s::write cac_preview testresult=%d begin", kWriteName, MMI_RESULT_FAIL);
         write_byte(kCacByte, work[kCacByte]);
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::write cac_preview end", kWriteName);
+        MMI_LOGD(kTag, "%s::write cac_preview end", kWriteName);
         g_bAutoTestRunning = 0;
     }
     // Without the roll-up this compares byte 99, left by the decode above; kept so.
@@ -164,8 +159,7 @@ int mmi_AutoTest_testinfo_Read(const char *command, int length, char *reply,
     size_t n = static_cast<size_t>(comma - command);
     if (n > sizeof(index) - 1) n = sizeof(index) - 1;
     memcpy(index, command, n);
-    __android_log_print(ANDROID_LOG_DEBUG, "TESTINFO", "%s::buf_In=%s;index=%s", kName, command,
-                        index);
+    MMI_LOGD("TESTINFO", "%s::buf_In=%s;index=%s", kName, command, index);
     if (!hw::ftx_api_GetTestInfoFlag) return 0;
     int item = atoi(index);
     if (item < 0 || item >= MMI_TESTINFO_ITEMS) {
@@ -202,17 +196,15 @@ int CheckParaResult(const char *spec, int value, int isMax) {
     static const char kName[] = "CheckParaResult";
     const char *colon = spec != nullptr ? strchr(spec, ':') : nullptr;
     if (colon == nullptr) {
-        __android_log_print(ANDROID_LOG_DEBUG, "", "%s input para error: %s", kName,
-                            spec != nullptr ? spec : "");
+        MMI_LOGD("", "%s input para error: %s", kName, spec != nullptr ? spec : "");
         return 0;
     }
     int limit = atoi(colon + 1);
     int max = isMax & 1;
-    __android_log_print(ANDROID_LOG_DEBUG, "", "%s begin para list: strpara=%d,ival=%d,bmax=%d",
-                        kName, limit, value, max);
+    MMI_LOGD("", "%s begin para list: strpara=%d,ival=%d,bmax=%d", kName, limit, value, max);
     // A value equal to the limit fails either way.
     int ok = max ? value < limit : value > limit;
-    if (!ok) __android_log_print(ANDROID_LOG_DEBUG, "", "%s end", kName);
+    if (!ok) MMI_LOGD("", "%s end", kName);
     return ok;
 }
 

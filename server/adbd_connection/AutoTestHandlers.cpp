@@ -8,6 +8,8 @@
 
 #include <android/log.h>
 
+#include "mmi_loglevel.h"
+
 #include "devfs.h"
 #include "ftx_lib_binding.h"
 #include "mmi_testinfo.h"
@@ -17,7 +19,7 @@ namespace {
 const char kTag[] = "AtThread";
 
 void log_begin(const char *name) {
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin", name);
+    MMI_LOGD(kTag, "%s begin", name);
 }
 
 int run_shell(const char *name, const char *line) {
@@ -40,32 +42,30 @@ bool is_plain_argument(const char *s) {
 int AutoTest_testinfo(const char *parm, int parmLen, char *reply, unsigned int replySize) {
     if (parmLen < 1) return 0;
     if (strstr(parm, "read") != nullptr) {
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin:bufIn=%s", "AutoTest_testinfo_Read",
-                            parm);
+        MMI_LOGD(kTag, "%s begin:bufIn=%s", "AutoTest_testinfo_Read", parm);
         return mmi_AutoTest_testinfo_Read(parm, parmLen, reply, replySize);
     }
     if (strstr(parm, "write") != nullptr) {
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin:bufIn=%s", "AutoTest_testinfo_Write",
-                            parm);
+        MMI_LOGD(kTag, "%s begin:bufIn=%s", "AutoTest_testinfo_Write", parm);
         return mmi_AutoTest_testinfo_Write(parm, parmLen);
     }
     return 0;
 }
 
 int AutoTest_FileOpt_Read(const char *parm, int parmLen, char *, unsigned int) {
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin,bufIn=%s", __func__, parm);
+    MMI_LOGD(kTag, "%s begin,bufIn=%s", __func__, parm);
     if (hw::mmi_AutoTest_FileOpt_Read) hw::mmi_AutoTest_FileOpt_Read(parm, parmLen);
     return 1;
 }
 
 int AutoTest_FileOpt_Write(const char *parm, int parmLen, char *, unsigned int) {
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin,bufIn=%s", __func__, parm);
+    MMI_LOGD(kTag, "%s begin,bufIn=%s", __func__, parm);
     if (hw::mmi_AutoTest_FileOpt_Write) hw::mmi_AutoTest_FileOpt_Write(parm, parmLen);
     return 1;
 }
 
 int AutoTest_FileOpt_Remove(const char *parm, int parmLen, char *reply, unsigned int replySize) {
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin,bufIn=%s", __func__, parm);
+    MMI_LOGD(kTag, "%s begin,bufIn=%s", __func__, parm);
     if (hw::mmi_AutoTest_FileOpt_Remove)
         hw::mmi_AutoTest_FileOpt_Remove(parm, parmLen, reply, replySize);
     return 1;
@@ -94,7 +94,7 @@ int AutoTest_CABC_Close(const char *, int, char *, unsigned int) {
 }
 
 int WiFiDataRate_set(const char *parm, int, char *, unsigned int) {
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s begin,bufIn=%s", __func__, parm);
+    MMI_LOGD(kTag, "%s begin,bufIn=%s", __func__, parm);
     // The parameter goes into a shell line: anything but plain words is refused.
     if (!is_plain_argument(parm)) {
         __android_log_print(ANDROID_LOG_ERROR, kTag, "%s::refused parameter %s", __func__, parm);
@@ -113,8 +113,8 @@ int AutoTest_EnterLowCostMode(const char *, int, char *, unsigned int) {
                             __func__);
         return 1;
     }
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::ftx_api_EnterLostCostMode begin", __func__);
+    MMI_LOGD(kTag, "%s::ftx_api_EnterLostCostMode begin", __func__);
     hw::ftx_api_EnterLowCostMode();
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::ftx_api_EnterLostCostMode end", __func__);
+    MMI_LOGD(kTag, "%s::ftx_api_EnterLostCostMode end", __func__);
     return 1;
 }

@@ -7,6 +7,8 @@
 
 #include <android/log.h>
 
+#include "mmi_loglevel.h"
+
 namespace {
 
 const char kTag[] = "CMDPARSE";
@@ -22,6 +24,14 @@ bool same_text(const char *stored, const char *text) {
     if (stored == nullptr || text == nullptr) return stored == text;
     size_t n = strlen(stored);
     return strncmp(stored, text, n) == 0 && strlen(text) == n;
+}
+
+// strncmp(line, cmd, strlen(cmd)) == 0, stopping at the first difference.
+bool starts_with(const char *line, const char *cmd) {
+    while (*cmd != '\0') {
+        if (*line++ != *cmd++) return false;
+    }
+    return true;
 }
 
 char *copy_text(const char *s) {
@@ -48,25 +58,22 @@ unsigned int registerModule(const char *cmd, const char *action, AtCmdFun fun, i
             e->fun = fun;
             return REGISTER_OK;
         }
-        __android_log_print(ANDROID_LOG_DEBUG, kTag,
-                            "have a fun fo  the same modele, type ,action.");
+        MMI_LOGD(kTag, "have a fun fo  the same modele, type ,action.");
         return REGISTER_EXISTS;
     }
     CommandEntry *e = static_cast<CommandEntry *>(calloc(1, sizeof(CommandEntry)));
     if (e == nullptr) {
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "calloc fail");
+        MMI_LOGD(kTag, "calloc fail");
         return REGISTER_NOMEM;
     }
     if (cmd != nullptr) {
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::cmd is %s,len=%d", kName, cmd,
-                            static_cast<int>(strlen(cmd)));
+        MMI_LOGD(kTag, "%s::cmd is %s,len=%d", kName, cmd, static_cast<int>(strlen(cmd)));
         e->cmd = copy_text(cmd);
     }
-    __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::action is %s,len=%d", kName, action,
-                        static_cast<int>(strlen(action)));
+    MMI_LOGD(kTag, "%s::action is %s,len=%d", kName, action, static_cast<int>(strlen(action)));
     e->action = copy_text(action);
     if ((cmd != nullptr && e->cmd == nullptr) || e->action == nullptr) {
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "calloc fail");
+        MMI_LOGD(kTag, "calloc fail");
         free_entry(e);
         return REGISTER_NOMEM;
     }
@@ -86,17 +93,19 @@ unsigned int parseCommand(const char *cmdString, AtCmdFun *fun, char *parm) {
     }
     unsigned int ret = PARSE_NOFUND;
     const size_t lineLen = strlen(cmdString);
+    // Every row is looked at for every command: the walk's own line is only formatted
+    // when debug entries are kept.
+    const bool walkLog = mmi_log_enabled(ANDROID_LOG_DEBUG);
     for (CommandEntry *e = g_cmd_list.next; e != &g_cmd_list; e = e->next) {
-        __android_log_print(ANDROID_LOG_DEBUG, kTag,
-                            "tmpcmd->cmd = %s,tmpcmd->action = %s,cmdString = %s",
-                            e->cmd != nullptr ? e->cmd : "", e->action, cmdString);
-        if (e->cmd == nullptr) continue;
+        if (walkLog)
+            __android_log_print(ANDROID_LOG_DEBUG, kTag,
+                                "tmpcmd->cmd = %s,tmpcmd->action = %s,cmdString = %s",
+                                e->cmd != nullptr ? e->cmd : "", e->action, cmdString);
+        if (e->cmd == nullptr || !starts_with(cmdString, e->cmd)) continue;
         const size_t cmdLen = strlen(e->cmd);
-        if (strncmp(cmdString, e->cmd, cmdLen) != 0) continue;
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::before cpy parm=%s", kName, parm);
-        __android_log_print(ANDROID_LOG_DEBUG, kTag,
-                            "%s::strlen(cmdString)=%d,strlen(tmpcmd->cmd)=%d", kName,
-                            static_cast<int>(lineLen), static_cast<int>(cmdLen));
+        MMI_LOGD(kTag, "%s::before cpy parm=%s", kName, parm);
+        MMI_LOGD(kTag, "%s::strlen(cmdString)=%d,strlen(tmpcmd->cmd)=%d", kName,
+                 static_cast<int>(lineLen), static_cast<int>(cmdLen));
         // The character after the command is a separator whatever it is. With nothing
         // after it the parameter keeps what an earlier candidate copied.
         if (lineLen >= cmdLen + 2) {
@@ -105,30 +114,29 @@ unsigned int parseCommand(const char *cmdString, AtCmdFun *fun, char *parm) {
             memcpy(parm, cmdString + cmdLen + 1, n);
             parm[n] = '\0';
         }
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::after cpy parm=%s", kName, parm);
+        MMI_LOGD(kTag, "%s::after cpy parm=%s", kName, parm);
         if (parm[0] == '\0') {
             *fun = e->fun;
-            __android_log_print(ANDROID_LOG_DEBUG, kTag, "parse valid command");
+            MMI_LOGD(kTag, "parse valid command");
             return PARSE_OK;
         }
         if (e->action[0] != '\0') {
             const size_t actionLen = strlen(e->action);
             const size_t parmLen = strlen(parm);
-            __android_log_print(ANDROID_LOG_DEBUG, kTag, "%s::tmpcmd->action=%d", kName,
-                                static_cast<int>(actionLen));
+            MMI_LOGD(kTag, "%s::tmpcmd->action=%d", kName, static_cast<int>(actionLen));
             __android_log_print(ANDROID_LOG_ERROR, kTag,
                                 "%s::parm=%s,parm len=%d,cmd->action=%s,action len=%d", kName, parm,
                                 static_cast<int>(parmLen), e->action, static_cast<int>(actionLen));
             if (strncmp(parm, e->action, actionLen) == 0 && parmLen == actionLen) {
                 *fun = e->fun;
-                __android_log_print(ANDROID_LOG_DEBUG, kTag, "parse valid command");
+                MMI_LOGD(kTag, "parse valid command");
                 return PARSE_OK;
             }
             continue;
         }
         // A later candidate may still override this one.
         *fun = e->fun;
-        __android_log_print(ANDROID_LOG_DEBUG, kTag, "parse valid command");
+        MMI_LOGD(kTag, "parse valid command");
         ret = PARSE_OK;
     }
     if (ret == PARSE_OK) return PARSE_OK;
@@ -145,18 +153,17 @@ int AtCommandProcess(const char *cmdString, char *reply, unsigned int replySize)
     } else if (fun == nullptr) {
         ret = AT_RESULT_NOHANDLER;
     } else {
-        __android_log_print(ANDROID_LOG_DEBUG, kAtTag, "callfun = %d",
-                            static_cast<int>(reinterpret_cast<uintptr_t>(fun)));
+        MMI_LOGD(kAtTag, "callfun = %d", static_cast<int>(reinterpret_cast<uintptr_t>(fun)));
         int answer = fun(g_parm, static_cast<int>(strlen(g_parm)), reply, replySize);
         if (answer & 1) {
-            __android_log_print(ANDROID_LOG_DEBUG, kAtTag, "invoke fun success");
+            MMI_LOGD(kAtTag, "invoke fun success");
             ret = AT_RESULT_OK;
         } else {
             ret = AT_RESULT_FAIL;
         }
-        __android_log_print(ANDROID_LOG_DEBUG, kAtTag, "AtCommandProcess middle ret = %d", ret);
+        MMI_LOGD(kAtTag, "AtCommandProcess middle ret = %d", ret);
     }
-    __android_log_print(ANDROID_LOG_DEBUG, kAtTag, "AtCommandProcess ret = %d", ret);
+    MMI_LOGD(kAtTag, "AtCommandProcess ret = %d", ret);
     return ret;
 }
 
