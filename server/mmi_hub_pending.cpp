@@ -12,9 +12,6 @@
         return value;                                                              \
     }
 
-PENDING(int, mmi_TestInfoEntry, (void), 0, "FTX_MAIN")
-PENDING(int, mmi_DeviceTestEntry, (void), 0, "FTX_MAIN")
-PENDING(int, mmi_testwnd_MonomerPreview_Entry, (void), 0, "FTX_MAIN")
 PENDING(int, mmi_testwnd_Coupling_Entry, (void), 0, "FTX_MAIN")
 PENDING(int, mmi_AgingTestEntry, (void), 0, "AgingTest")
 PENDING(int, mmi_AgingTest_Start_Entry, (void), 0, "AgingTest")
