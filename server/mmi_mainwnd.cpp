@@ -70,8 +70,8 @@ bool s_tpAlertShown = false;
 // Wi-Fi key state.
 std::atomic<int> s_wifiConnecting{0};
 std::atomic<int> s_unlockFlag{0};
-int s_unlockCount = 0;  // input thread
-long long s_unlockFirstMs = 0;
+std::atomic<int> s_unlockCount{0};  // counted on the input thread, reset by the GUI thread
+std::atomic<long long> s_unlockFirstMs{0};
 
 // Power key (input thread and its long-press thread).
 std::atomic<long long> s_powerDownMs{0};
