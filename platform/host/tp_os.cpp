@@ -65,7 +65,9 @@ extern "C" tp_os_thread_t tp_os_thread_create(const char *name, int priority, si
     pthread_attr_init(&attr);
     pthread_attr_setdetachstate(&attr, PTHREAD_CREATE_DETACHED);
     if (stack_size > 0) {
-        if (stack_size < 65536) stack_size = 65536;
+        // Handset stack sizes are tuned for its libraries; the host's text rendering
+        // (FreeType, iconv) needs more, so small requests are raised.
+        if (stack_size < 512 * 1024) stack_size = 512 * 1024;
         pthread_attr_setstacksize(&attr, stack_size);
     }
     auto *start = new ThreadStart{func, arg, {0}};
