@@ -13,8 +13,10 @@
 #include "mmi_autotest.h"
 #include "mmi_bars.h"
 #include "mmi_guithread.h"
+#include "mmi_mainwnd.h"
 #include "mmi_infoscreen.h"
 #include "mmi_runstate.h"
+#include "mmi_settings.h"
 #include "mmi_testinfo.h"
 #include "mmi_testwnd.h"
 #include "tp_os.h"
@@ -121,13 +123,12 @@ void on_choose(HWND hwnd, LINT id, int nc, DWORD add) {
 }
 
 void show_bars(HWND hWnd) {
-    char back[256], title[256];
-    translate("info_Back", back, sizeof(back));
+    char title[256];
     translate("menu_DeviceTest", title, sizeof(title));
     tp_skb_set_text_col(kColourText);
-    tp_skb_set_text_items(hWnd, "", "", back);
+    tp_skb_set_text_items(hWnd, "", "", g_cItemBack);
     tp_skb_update(hWnd);
-    tp_batteryshow_set_text_items_byIndex(hWnd, title, 1);
+    tp_batteryshow_set_text_items(hWnd, "", title, "");
     tp_batteryshow_update(hWnd);
 }
 
@@ -155,6 +156,7 @@ LRESULT devicetest_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             HWND list =
                 CreateWindowEx(CTRL_SCROLLVIEW, "", WS_VISIBLE | WS_BORDER | SVS_LOOP, WS_EX_NONE,
                                kListId, 0, 3, RECTW(rc), RECTH(rc) - 3, hWnd, 0);
+            if (g_mmiLogFont[2]) SetWindowFont(list, g_mmiLogFont[2]);
             SendMessage(list, SVM_SETITEMDRAW, 0, (LPARAM)draw_row);
             SetNotificationCallback(list, on_choose);
             fill_list(list);

@@ -12,8 +12,10 @@
 #include "minigui/control.h"
 #include "mmi_bars.h"
 #include "mmi_guithread.h"
+#include "mmi_mainwnd.h"
 #include "mmi_identity.h"
 #include "mmi_testinfo.h"
+#include "mmi_settings.h"
 #include "mmi_testwnd.h"
 #include "tp_os.h"
 
@@ -102,13 +104,12 @@ void fill_list(HWND list) {
 }
 
 void show_bars(HWND hWnd) {
-    char back[256], title[256];
-    translate("info_Back", "Back", back, sizeof(back));
+    char title[256];
     translate("menu_ProduceInfo", "menu_ProduceInfo", title, sizeof(title));
     tp_skb_set_text_col(kColourText);
-    tp_skb_set_text_items(hWnd, "", "", back);
+    tp_skb_set_text_items(hWnd, "", "", g_cItemBack);
     tp_skb_update(hWnd);
-    tp_batteryshow_set_text_items_byIndex(hWnd, title, 1);
+    tp_batteryshow_set_text_items(hWnd, "", title, "");
     tp_batteryshow_update(hWnd);
 }
 
@@ -119,6 +120,7 @@ LRESULT info_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             GetClientRect(hWnd, &rc);
             HWND list = CreateWindowEx(CTRL_SCROLLVIEW, "", WS_VISIBLE | WS_BORDER, WS_EX_NONE,
                                        kListId, 0, 3, RECTW(rc), RECTH(rc) - 3, hWnd, 0);
+            if (g_mmiLogFont[3]) SetWindowFont(list, g_mmiLogFont[3]);
             SendMessage(list, SVM_SETITEMDRAW, 0, (LPARAM)draw_line);
             fill_list(list);
             SetFocusChild(list);

@@ -14,6 +14,7 @@
 #include "mmi_bars.h"
 #include "minigui/control.h"
 #include "mmi_guithread.h"
+#include "mmi_mainwnd.h"
 #include "mmi_runstate.h"
 #include "mmi_testinfo.h"
 #include "tp_os.h"
@@ -231,9 +232,11 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
                 reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
             char title[MMI_TESTWND_TEXT_SIZE];
             translate(d->titleKey, title, sizeof(title));
-            HWND ctrl = CreateWindowEx(CTRL_STATIC, title, WS_VISIBLE | SS_CENTER | SS_NOPREFIX,
-                                       WS_EX_NONE, MMI_TESTWND_TITLE_ID, 0, 0, w, 0, hWnd, 0);
-            (void)ctrl;
+            HWND ctrl =
+                CreateWindowEx(CTRL_STATIC, title, WS_VISIBLE | WS_BORDER | SS_CENTER | SS_NOPREFIX,
+                               WS_EX_NONE, MMI_TESTWND_TITLE_ID, 0, 0, w, 0, hWnd, 0);
+            if (g_mmiLogFont[1] && ctrl != HWND_INVALID) SetWindowFont(ctrl, g_mmiLogFont[1]);
+            if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
             d->state->hwnd = hWnd;
             if (*d->start) (*d->start)(d->state->mode.load());
             mmi_set_current_test(d->domain);
@@ -320,6 +323,10 @@ HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
     d->state->hwnd = hWnd;
     mmi_testwnd_register_open(hWnd, d->stopEntry);
     ShowWindow(hWnd, SW_SHOWNORMAL);
+    // The bars keep a record per shown window: this one's starts with the fail label only.
+    tp_skb_set_text_items(hWnd, "", "", "");
+    tp_batteryshow_set_text_items(hWnd, "", "", "");
+    mmi_testwnd_show_keys(hWnd, d->titleKey, 0);
     return hWnd;
 }
 
