@@ -13,6 +13,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <filesystem>
 #include <fstream>
 #include <string>
 #include <thread>
@@ -205,6 +206,7 @@ int main() {
     close(bare);
     echo.join();
     close(chan);
-    std::string rm = std::string("rm -rf ") + root;
-    return system(rm.c_str()) == 0 ? 0 : 0;
+    std::error_code ec;
+    std::filesystem::remove_all(root, ec);
+    return 0;
 }
