@@ -16,6 +16,14 @@ namespace {
 
 constexpr Uint32 kMaxSide = 16384;
 constexpr long kMaxFile = 64L << 20;
+// A few kilobytes of compressed PNG or 1-bit BMP can claim gigabytes of pixels: pictures
+// are refused above 64 MB of screen pixels, before anything is decoded.
+constexpr uint64_t kMaxPixels = 4096u * 4096u;
+
+bool too_big(Uint32 w, Uint32 h) {
+    return w == 0 || h == 0 || w > kMaxSide || h > kMaxSide ||
+           static_cast<uint64_t>(w) * h > kMaxPixels;
+}
 
 Uint32 rd16(const Uint8 *p) {
     return p[0] | (p[1] << 8);
@@ -77,7 +85,7 @@ int load_bmp(PBITMAP bmp, const Uint8 *d, size_t size) {
     bool topDown = h < 0;
     Uint32 W = static_cast<Uint32>(w),
            H = topDown ? 0u - static_cast<Uint32>(h) : static_cast<Uint32>(h);
-    if (w <= 0 || H == 0 || W > kMaxSide || H > kMaxSide) return ERR_BMP_LOAD;
+    if (w <= 0 || too_big(W, H)) return ERR_BMP_LOAD;
     if (comp != 0 && !(comp == 3 && (bpp == 16 || bpp == 32))) return ERR_BMP_NOT_SUPPORTED;
     if (bpp != 1 && bpp != 4 && bpp != 8 && bpp != 16 && bpp != 24 && bpp != 32)
         return ERR_BMP_NOT_SUPPORTED;
@@ -153,7 +161,7 @@ int load_png(PBITMAP bmp, const Uint8 *d, size_t size) {
     memset(&img, 0, sizeof(img));
     img.version = PNG_IMAGE_VERSION;
     if (png_image_begin_read_from_memory(&img, d, size) == 0) return ERR_BMP_LOAD;
-    if (img.width == 0 || img.height == 0 || img.width > kMaxSide || img.height > kMaxSide) {
+    if (too_big(img.width, img.height)) {
         png_image_free(&img);
         return ERR_BMP_LOAD;
     }
