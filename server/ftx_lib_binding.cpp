@@ -324,28 +324,45 @@ void ftx_hw_unbind_all(void) {
         e->slot->set(nullptr);
 }
 
-int ftx_init_lib_factory_dll(void) {
-    static const char kName[] = "ftx_init_lib_factory_dll";
-    __android_log_print(ANDROID_LOG_ERROR, kStartTag,
-                        "%s ftx_init_lib_factory_dll load lib begin\n", "appMain");
-    void *h = open_library(lib_dvk_factory, kFactoryLib, kFactoryLabel);
+namespace {
+
+// A start-up binder: opens its library and binds its set, logging as "DVK_FTX".
+struct startup_binder {
+    const char *name;
+    std::atomic<void *> &handle;
+    const char *file;
+    const char *label;
+    const ftx_sym_binding *rows;
+    int count;
+};
+
+int bind_startup(const startup_binder &b) {
+    __android_log_print(ANDROID_LOG_ERROR, kStartTag, "%s %s load lib begin\n", "appMain", b.name);
+    void *h = open_library(b.handle, b.file, b.label);
     if (h == nullptr) {
-        log_loader_error(kStartTag, kName);
+        log_loader_error(kStartTag, b.name);
         return -1;
     }
-    return ftx_bind_symbols(h, kFactoryLabel, kStartTag, kName, kStartupSet, COUNT(kStartupSet));
+    return ftx_bind_symbols(h, b.label, kStartTag, b.name, b.rows, b.count);
+}
+
+}  // namespace
+
+int ftx_init_lib_factory_dll(void) {
+    static const startup_binder b = {
+        "ftx_init_lib_factory_dll", lib_dvk_factory, kFactoryLib, kFactoryLabel, kStartupSet,
+        COUNT(kStartupSet)};
+    return bind_startup(b);
 }
 
 int ftx_init_libdvk_ncoredevice_dll(void) {
-    static const char kName[] = "ftx_init_libdvk_ncoredevice_dll";
-    __android_log_print(ANDROID_LOG_ERROR, kStartTag,
-                        "%s ftx_init_libdvk_ncoredevice_dll load lib begin\n", "appMain");
-    void *h = open_library(g_libcoredevice, kCoreLib, kCoreLabel);
-    if (h == nullptr) {
-        log_loader_error(kStartTag, kName);
-        return -1;
-    }
-    return ftx_bind_symbols(h, kCoreLabel, kStartTag, kName, kBatterySet, COUNT(kBatterySet));
+    static const startup_binder b = {"ftx_init_libdvk_ncoredevice_dll",
+                                     g_libcoredevice,
+                                     kCoreLib,
+                                     kCoreLabel,
+                                     kBatterySet,
+                                     COUNT(kBatterySet)};
+    return bind_startup(b);
 }
 
 int Get_libcoredevice_Interface(void) {
