@@ -7,16 +7,12 @@
 
 #include <android/log.h>
 
-#include "ftx_config.h"
 #include "ftx_lib_binding.h"
-#include "minigui/control.h"
 #include "mmi_autotest.h"
-#include "mmi_bars.h"
 #include "mmi_guithread.h"
-#include "mmi_mainwnd.h"
 #include "mmi_infoscreen.h"
+#include "mmi_listscreen.h"
 #include "mmi_runstate.h"
-#include "mmi_settings.h"
 #include "mmi_testinfo.h"
 #include "mmi_testwnd.h"
 #include "tp_os.h"
@@ -26,13 +22,11 @@
 
 namespace {
 
-const int kListId = 21;
 const int kColourText = 19;
 const int kColourPass = 10;
 const int kColourFail = 12;
-const int kColourWindow = 18;
 
-// GUI thread only.
+// GUI thread only, apart from the handle.
 std::atomic<HWND> s_window{HWND_INVALID};
 mmi_devicetest_row s_rows[MMI_DEVICETEST_MAX_ROWS];
 int s_rowCount;
@@ -43,7 +37,9 @@ int result_of(const unsigned char *flags, int item) {
     return (flags[item / 4] >> ((3 - item % 4) * 2)) & 3;
 }
 
-void read_results(void) {
+// A run rebuilds the item list; the rows follow it and reread the record.
+int fill_rows(void) {
+    s_rowCount = mmi_devicetest_build_rows(g_pTestItemListHead, s_rows, MMI_DEVICETEST_MAX_ROWS);
     unsigned char flags[MMI_TESTINFO_FLAGS_SIZE] = {0};
     if (hw::ftx_api_GetTestInfoFlag) hw::ftx_api_GetTestInfoFlag(flags);
     GetTestItemsResult(flags);
@@ -51,35 +47,18 @@ void read_results(void) {
         int idx = s_rows[i].resultIndex;
         s_results[i] = idx >= 0 && idx < MMI_TESTINFO_ITEMS ? (int)g_testinfo[idx].test_result : 0;
     }
-}
-
-void translate(const char *key, char *out, size_t size) {
-    tp_os_strlcpy(out, key, size);
-    Read_LangCfgFromList(key, out);
+    return s_rowCount;
 }
 
 void draw_row(HWND hWnd, HSVITEM hsvi, HDC hdc, RECT *rc) {
-    int i = (int)scrollview_get_item_adddata(hsvi);
+    int i = mmi_listscreen_row(hsvi);
     if (i < 0 || i >= s_rowCount) return;
-    if (scrollview_is_item_hilight(hWnd, hsvi)) {
-        SetBrushColor(hdc, SysPixelIndex[7]);
-        FillBox(hdc, rc->left, rc->top, RECTWP(rc), RECTHP(rc));
-    }
-    char label[256], word[256] = "";
-    translate(s_rows[i].labelKey, label, sizeof(label));
-    int colour = mmi_devicetest_result_colour(s_results[i]);
-    if (s_results[i] == MMI_RESULT_PASS) translate("Result_pass", word, sizeof(word));
-    if (s_results[i] == MMI_RESULT_FAIL) translate("Result_fail", word, sizeof(word));
-    SetBkMode(hdc, BM_TRANSPARENT);
-    SetTextColor(hdc, SysPixelIndex[colour]);
-    RECT text = *rc;
-    text.left += RECTWP(rc) / 20;
-    text.right -= RECTWP(rc) / 20;
-    DrawText(hdc, label, -1, &text, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
-    if (word[0]) DrawText(hdc, word, -1, &text, DT_RIGHT | DT_VCENTER | DT_SINGLELINE);
-    SetPenColor(hdc, SysPixelIndex[20]);
-    MoveTo(hdc, rc->left, rc->bottom - 1);
-    LineTo(hdc, rc->right, rc->bottom - 1);
+    char label[MMI_TESTWND_TEXT_SIZE], word[MMI_TESTWND_TEXT_SIZE] = "";
+    mmi_translate(s_rows[i].labelKey, label, sizeof(label));
+    if (s_results[i] == MMI_RESULT_PASS) mmi_translate("Result_pass", word, sizeof(word));
+    if (s_results[i] == MMI_RESULT_FAIL) mmi_translate("Result_fail", word, sizeof(word));
+    mmi_listscreen_draw_row(hWnd, hsvi, hdc, rc, label, word,
+                            mmi_devicetest_result_colour(s_results[i]));
 }
 
 void open_row(const mmi_devicetest_row *row) {
@@ -102,17 +81,13 @@ void open_row(const mmi_devicetest_row *row) {
     }
 }
 
-void on_choose(HWND hwnd, LINT id, int nc, DWORD add) {
-    (void)hwnd;
-    (void)id;
-    if (nc != SVN_ITEMCHOSEN) return;
-    int i = (int)scrollview_get_item_adddata((HSVITEM)add);
+void choose_row(int i) {
     if (i < 0 || i >= s_rowCount) return;
     unsigned char flags[MMI_TESTINFO_FLAGS_SIZE] = {0};
     if (hw::ftx_api_GetTestInfoFlag) hw::ftx_api_GetTestInfoFlag(flags);
     int choice = mmi_devicetest_choice(&s_rows[i], flags, g_bAutoTestRunning.load());
     if (choice < 0) {
-        DT_DEBUG("%s device autotest running,please exit autotest.", __func__);
+        DT_DEBUG("%s device autotest running,please exit autotest.", "on_choose");
         return;
     }
     if (choice > 0) {
@@ -122,85 +97,8 @@ void on_choose(HWND hwnd, LINT id, int nc, DWORD add) {
     open_row(&s_rows[i]);
 }
 
-void show_bars(HWND hWnd) {
-    char title[256];
-    translate("menu_DeviceTest", title, sizeof(title));
-    tp_skb_set_text_col(kColourText);
-    tp_skb_set_text_items(hWnd, "", "", g_cItemBack);
-    tp_skb_update(hWnd);
-    tp_batteryshow_set_text_items(hWnd, "", title, "");
-    tp_batteryshow_update(hWnd);
-}
-
-void fill_list(HWND list) {
-    int cur = (int)SendMessage(list, SVM_GETCURSEL, 0, 0);
-    SendMessage(list, SVM_RESETCONTENT, 0, 0);
-    s_rowCount = mmi_devicetest_build_rows(g_pTestItemListHead, s_rows, MMI_DEVICETEST_MAX_ROWS);
-    read_results();
-    const int w = g_ptScreenInfo.width;
-    for (int i = 0; i < s_rowCount; i++) {
-        SVITEMINFO info;
-        info.nItem = i;
-        info.nItemHeight = (w / 15) * 2;
-        info.addData = (DWORD)i;
-        SendMessage(list, SVM_ADDITEM, 0, (LPARAM)&info);
-    }
-    SendMessage(list, SVM_SETCURSEL, cur > 0 && cur < s_rowCount ? cur : 0, 1);
-}
-
-LRESULT devicetest_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
-    switch (message) {
-        case MSG_CREATE: {
-            RECT rc;
-            GetClientRect(hWnd, &rc);
-            HWND list =
-                CreateWindowEx(CTRL_SCROLLVIEW, "", WS_VISIBLE | WS_BORDER | SVS_LOOP, WS_EX_NONE,
-                               kListId, 0, 3, RECTW(rc), RECTH(rc) - 3, hWnd, 0);
-            if (g_mmiLogFont[2]) SetWindowFont(list, g_mmiLogFont[2]);
-            SendMessage(list, SVM_SETITEMDRAW, 0, (LPARAM)draw_row);
-            SetNotificationCallback(list, on_choose);
-            fill_list(list);
-            SetFocusChild(list);
-            show_bars(hWnd);
-            break;
-        }
-        case MSG_ACTIVE:
-            if (wParam) show_bars(hWnd);
-            break;
-        case MSG_TIMER:
-            if (wParam == MMI_DEVICETEST_TIMER_REFRESH) {
-                DT_DEBUG("%s refresh", __func__);
-                // A run rebuilds the item list; the rows follow it.
-                fill_list(GetDlgItem(hWnd, kListId));
-                InvalidateRect(GetDlgItem(hWnd, kListId), nullptr, TRUE);
-                show_bars(hWnd);
-            }
-            break;
-        case MSG_KEYDOWN:
-            if (wParam == MMI_KEY_FAIL) {
-                SendMessage(hWnd, MSG_CLOSE, 0, 0);
-                return 0;
-            }
-            break;
-        case MSG_PAINT: {
-            HDC hdc = BeginPaint(hWnd);
-            SetPenColor(hdc, SysPixelIndex[kColourPass]);
-            SetPenWidth(hdc, 3);
-            MoveTo(hdc, 0, 0);
-            LineTo(hdc, g_ptScreenInfo.width, 0);
-            EndPaint(hWnd, hdc);
-            return 0;
-        }
-        case MSG_CLOSE:
-            s_window = HWND_INVALID;
-            DestroyAllControls(hWnd);
-            DestroyMainWindow(hWnd);
-            return 0;
-        default:
-            break;
-    }
-    return DefaultMainWinProc(hWnd, message, wParam, lParam);
-}
+const mmi_listscreen_desc kList = {"Device Test", "menu_DeviceTest", 2,         0,        fill_rows,
+                                   draw_row,      choose_row,        MSG_TIMER, &s_window};
 
 }  // namespace
 
@@ -246,33 +144,10 @@ int mmi_devicetest_choice(const mmi_devicetest_row *row, const unsigned char *fl
 }
 
 int mmi_DeviceTestEntry(void) {
-    HWND open = s_window.load();
-    if (open != HWND_INVALID) {
-        ShowWindow(open, SW_SHOWNORMAL);
-        return 0;
-    }
-    RECT rc;
-    mmi_testwnd_rect(g_ptScreenInfo.width, g_ptScreenInfo.height, &rc);
-    MAINWINCREATE create;
-    memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_CAPTION | WS_VISIBLE;
-    create.dwExStyle = WS_EX_NONE;
-    create.spCaption = "Device Test";
-    create.hHosting = mmi_guithread_window();
-    create.MainWindowProc = devicetest_proc;
-    create.lx = rc.left;
-    create.ty = rc.top;
-    create.rx = rc.right;
-    create.by = rc.bottom;
-    create.iBkColor = SysPixelIndex[kColourWindow];
-    HWND hWnd = CreateMainWindow(&create);
-    if (hWnd == HWND_INVALID) {
-        __android_log_print(ANDROID_LOG_ERROR, DT_TAG, "%s CreateMainWindow fail", __func__);
-        return -1;
-    }
-    s_window = hWnd;
-    ShowWindow(hWnd, SW_SHOWNORMAL);
-    return 0;
+    // Rows as high as the main menu's.
+    static mmi_listscreen_desc list = kList;
+    list.itemHeight = (g_ptScreenInfo.width / 15) * 2;
+    return mmi_listscreen_open(&list);
 }
 
 int mmi_DeviceTest_IsOpen(void) {
@@ -285,5 +160,6 @@ HWND mmi_DeviceTest_Window(void) {
 
 void mmi_DeviceTest_Refresh(void) {
     HWND open = s_window.load();
+    DT_DEBUG("%s open=%d", __func__, open != HWND_INVALID);
     if (open != HWND_INVALID) SendMessage(open, MSG_TIMER, MMI_DEVICETEST_TIMER_REFRESH, 0);
 }

@@ -50,11 +50,6 @@ void install_stop_handler() {
     signal(SIGUSR1, signalHandler);
 }
 
-void translate(const char *key, char *out, size_t size) {
-    tp_os_strlcpy(out, key, size);
-    Read_LangCfgFromList(key, out);
-}
-
 const mmi_testwnd_desc *desc_of(HWND hWnd) {
     return reinterpret_cast<const mmi_testwnd_desc *>(GetWindowAdditionalData(hWnd));
 }
@@ -129,6 +124,40 @@ int Check_AllTestWnd_Closed(void) {
 
 // ---- helpers ----
 
+void mmi_translate(const char *key, char *out, size_t size) {
+    tp_os_strlcpy(out, key, size);
+    Read_LangCfgFromList(key, out);
+}
+
+HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
+    RECT rc;
+    mmi_testwnd_rect(g_ptScreenInfo.width, g_ptScreenInfo.height, &rc);
+    MAINWINCREATE create;
+    memset(&create, 0, sizeof(create));
+    create.dwStyle = WS_CAPTION | WS_VISIBLE;
+    create.dwExStyle = WS_EX_NONE;
+    create.spCaption = caption;
+    create.hHosting = mmi_guithread_window();
+    create.MainWindowProc = proc;
+    create.lx = rc.left;
+    create.ty = rc.top;
+    create.rx = rc.right;
+    create.by = rc.bottom;
+    create.iBkColor = SysPixelIndex[kColourWindow];
+    create.dwAddData = addData;
+    HWND hWnd = CreateMainWindow(&create);
+    if (hWnd == HWND_INVALID)
+        TW_ERROR("FTX_MAIN", "%s CreateMainWindow %s fail", __func__, caption);
+    return hWnd;
+}
+
+void mmi_testwnd_draw_top_line(HDC hdc) {
+    SetPenColor(hdc, SysPixelIndex[kColourPassLine]);
+    SetPenWidth(hdc, 3);
+    MoveTo(hdc, 0, 0);
+    LineTo(hdc, g_ptScreenInfo.width, 0);
+}
+
 void mmi_testwnd_rect(int w, int h, RECT *out) {
     out->left = 0;
     out->top = w / 15 + 10;
@@ -138,9 +167,9 @@ void mmi_testwnd_rect(int w, int h, RECT *out) {
 
 void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam) {
     char pass[MMI_TESTWND_TEXT_SIZE], fail[MMI_TESTWND_TEXT_SIZE], title[MMI_TESTWND_TEXT_SIZE];
-    translate("Result_pass", pass, sizeof(pass));
-    translate("Result_fail", fail, sizeof(fail));
-    translate(titleKey, title, sizeof(title));
+    mmi_translate("Result_pass", pass, sizeof(pass));
+    mmi_translate("Result_fail", fail, sizeof(fail));
+    mmi_translate(titleKey, title, sizeof(title));
     tp_skb_set_text_col(kColourText);
     if (wParam == MMI_TIMER_FOOLPROOF) {
         tp_skb_set_text_items(hWnd, pass, "", fail);
@@ -231,7 +260,7 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             d = reinterpret_cast<const mmi_testwnd_desc *>(
                 reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
             char title[MMI_TESTWND_TEXT_SIZE];
-            translate(d->titleKey, title, sizeof(title));
+            mmi_translate(d->titleKey, title, sizeof(title));
             HWND ctrl =
                 CreateWindowEx(CTRL_STATIC, title, WS_VISIBLE | WS_BORDER | SS_CENTER | SS_NOPREFIX,
                                WS_EX_NONE, MMI_TESTWND_TITLE_ID, 0, 0, w, 0, hWnd, 0);
@@ -271,12 +300,9 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             return 0;
         case MSG_PAINT: {
             HDC hdc = BeginPaint(hWnd);
-            SetPenColor(hdc, SysPixelIndex[kColourPassLine]);
-            SetPenWidth(hdc, 3);
-            MoveTo(hdc, 0, 0);
-            LineTo(hdc, w, 0);
+            mmi_testwnd_draw_top_line(hdc);
             char note[MMI_TESTWND_TEXT_SIZE];
-            translate(d->noteKey, note, sizeof(note));
+            mmi_translate(d->noteKey, note, sizeof(note));
             SetTextColor(hdc, SysPixelIndex[kColourText]);
             SetBkMode(hdc, BM_TRANSPARENT);
             RECT rc = {w / 8, w / 15 + 10, (w / 4) * 3 + w / 8, h - (h / 15 + 10)};
@@ -300,26 +326,8 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
 
 HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
     d->state->mode = mode;
-    RECT rc;
-    mmi_testwnd_rect(g_ptScreenInfo.width, g_ptScreenInfo.height, &rc);
-    MAINWINCREATE create;
-    memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_CAPTION | WS_VISIBLE;
-    create.dwExStyle = WS_EX_NONE;
-    create.spCaption = d->caption;
-    create.hHosting = mmi_guithread_window();
-    create.MainWindowProc = mmi_testwnd_proc;
-    create.lx = rc.left;
-    create.ty = rc.top;
-    create.rx = rc.right;
-    create.by = rc.bottom;
-    create.iBkColor = SysPixelIndex[kColourWindow];
-    create.dwAddData = reinterpret_cast<DWORD>(d);
-    HWND hWnd = CreateMainWindow(&create);
-    if (hWnd == HWND_INVALID) {
-        TW_ERROR(d->domain, "%s CreateMainWindow fail", __func__);
-        return hWnd;
-    }
+    HWND hWnd = mmi_testwnd_create(d->caption, mmi_testwnd_proc, reinterpret_cast<DWORD>(d));
+    if (hWnd == HWND_INVALID) return hWnd;
     d->state->hwnd = hWnd;
     mmi_testwnd_register_open(hWnd, d->stopEntry);
     ShowWindow(hWnd, SW_SHOWNORMAL);

@@ -71,6 +71,13 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam);
 // Helpers for every test window, generic or not.
 // The outer rectangle of a test window: between the title strip and the soft-key bar.
 void mmi_testwnd_rect(int w, int h, RECT *out);
+// Creates (not shows) a window in that rectangle, hosted by the main window, on the GUI
+// thread; addData reaches MSG_CREATE. HWND_INVALID on failure (logged).
+HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData);
+// The 3-pixel green line along the window's top edge.
+void mmi_testwnd_draw_top_line(HDC hdc);
+// The text of a language key, or the key itself when the language file lacks it.
+void mmi_translate(const char *key, char *out, size_t size);
 // Shows the pass label (wParam 5) or only the fail label, and the title in the strip.
 void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam);
 // Starts the fool-proof thread that sends MSG_TIMER 5 to st->hwnd after `seconds`.

@@ -291,7 +291,7 @@ TEST(Run, FullRunEndsWithThePreviewPassAndSwitchesTheMmiFlagOff) {
     h.chooseRow(0);
     ASSERT_TRUE(h.waitActive("Vibration Test"));
     h.key(60);
-    ASSERT_TRUE(h.dut.waitLog("devicetest_proc refresh"));
+    ASSERT_TRUE(h.dut.waitLog("mmi_DeviceTest_Refresh open=1"));
     EXPECT_EQ(1, h.result(316));
     EXPECT_EQ(1, h.result(64));
     EXPECT_EQ(0, h.result(66));
@@ -395,7 +395,7 @@ TEST(DeviceList, ShowsEachItemInTheColourOfItsResultAfterARun) {
     ASSERT_TRUE(h.waitActive("Vibration Test"));
     h.key(60);
     // The end of the run refreshes the open list from the record.
-    ASSERT_TRUE(h.dut.waitLog("devicetest_proc refresh"));
+    ASSERT_TRUE(h.dut.waitLog("mmi_DeviceTest_Refresh open=1"));
     ASSERT_TRUE(h.waitActive("Device Test"));
     h.idle();
     Png list = h.shot("device_test_list.png");
@@ -410,6 +410,29 @@ TEST(DeviceList, ShowsEachItemInTheColourOfItsResultAfterARun) {
     EXPECT_GT(greens(list, 0), 50);
     EXPECT_EQ(0, greens(first, 6));  // before the run the vibrator row was untested
     EXPECT_EQ(0, greens(first, 0));
+}
+
+TEST(InfoScreen, ShowsTheIdentityAndThePassedAndFailedItems) {
+    Handset h({kVibrator});
+    ASSERT_TRUE(h.start());
+    h.setResult(316, 1);
+    h.setResult(280, 2);
+    h.openDeviceList();
+    h.chooseRow(1);
+    ASSERT_TRUE(h.waitActive("Product Information"));
+    // The IMEI arrives through the library's callback; the screen then rebuilds.
+    h.idle();
+    Png info = h.shot("product_information.png");
+    // Lines 56 high from y 61: 5 the IMEI (value on the right), 7 item 64 failed by the
+    // fail of 280, 8 item 280 (red), 9 item 316 (green), nothing after.
+    auto top = [](int r) { return 61 + 56 * r; };
+    EXPECT_GT(info.count(400, top(5), 700, top(6), light), 50);
+    EXPECT_GT(info.count(0, top(7), 720, top(8), red), 50);
+    EXPECT_GT(info.count(0, top(8), 720, top(9), red), 50);
+    EXPECT_GT(info.count(0, top(9), 720, top(10), green), 50);
+    EXPECT_EQ(0, info.count(0, top(10), 720, top(11), green));
+    h.key(61);
+    EXPECT_TRUE(h.waitActive("Device Test"));
 }
 
 }  // namespace
