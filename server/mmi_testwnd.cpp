@@ -15,6 +15,7 @@
 #include "minigui/control.h"
 #include "mmi_guithread.h"
 #include "mmi_mainwnd.h"
+#include "mmi_monomer.h"
 #include "mmi_runstate.h"
 #include "mmi_testinfo.h"
 #include "tp_os.h"
@@ -25,6 +26,17 @@
 namespace {
 
 mmi_testwnd_state s_vibrator;
+mmi_testwnd_state s_hardVersion;
+
+// The panel firmware as the library describes it.
+void firmware_note(char *out, unsigned int size) {
+    char buf[FTX_FIRMWARE_TEXT_SIZE] = {0};
+    if (!hw::ftx_api_GetFireWare || hw::ftx_api_GetFireWare(buf) != 0) {
+        TW_ERROR("FTX_MONOMER_HARDVERSION", "%s ftx_api_GetFireWare fail", __func__);
+    }
+    buf[sizeof(buf) - 1] = '\0';
+    tp_os_strlcpy(out, buf, size);
+}
 
 // Colours of the system pixel table.
 const int kColourPassLine = 10;
@@ -54,8 +66,12 @@ const mmi_testwnd_desc *desc_of(HWND hWnd) {
     return reinterpret_cast<const mmi_testwnd_desc *>(GetWindowAdditionalData(hWnd));
 }
 
+int close_window(void *hWnd) {
+    return (int)SendMessage((HWND)hWnd, MSG_CLOSE, 0, 0);
+}
+
 void hw_stop(const mmi_testwnd_desc *d) {
-    if (*d->stop) (*d->stop)();
+    if (d->stop && *d->stop) (*d->stop)();
 }
 
 }  // namespace
@@ -66,7 +82,10 @@ const mmi_testwnd_desc g_testwndTable[] = {
     {"Vibration Test", "title_VibratorTest", "info_VibratorNote", 316, "FTX_VIBRATOR", 3,
      &hw::ftx_api_Vibrator_Test_Start, &hw::ftx_api_Vibrator_Test_Stop,
      "ftx_api_Vibrator_Test_Start", "ftx_api_Vibrator_Test_Stop", 500, 200, &s_vibrator,
-     mmi_testwnd_VibratorTest_Stop_Entry},
+     mmi_testwnd_VibratorTest_Stop_Entry, MMI_TESTWND_RUN_AUTO, nullptr, nullptr},
+    {"Hardware Version", "menu_NfcTest", "", -1, "FTX_MONOMER_HARDVERSION", 1, nullptr, nullptr, "",
+     "", 0, 0, &s_hardVersion, mmi_testwnd_Monomer_HardwareVersion_Stop, MMI_TESTWND_RUN_MONOMER,
+     Init_lib_HardVersion_Interface, firmware_note},
 };
 const int g_testwndCount = sizeof(g_testwndTable) / sizeof(g_testwndTable[0]);
 
@@ -250,6 +269,22 @@ void mmi_testwnd_record_fail(int resultIndex) {
     g_bAutoTestRunning = 0;
 }
 
+void mmi_testwnd_pass(const mmi_testwnd_desc *d) {
+    if (d->run == MMI_TESTWND_RUN_MONOMER) {
+        if (g_bMonomerPreviewRunning == 1) mmi_startNextMonomerPreviewItemTest(d->domain);
+        return;
+    }
+    mmi_testwnd_record_pass(d->resultIndex, d->domain);
+}
+
+void mmi_testwnd_fail(const mmi_testwnd_desc *d) {
+    if (d->run == MMI_TESTWND_RUN_MONOMER) {
+        g_bMonomerPreviewRunning = 0;
+        return;
+    }
+    mmi_testwnd_record_fail(d->resultIndex);
+}
+
 // ---- the generic window ----
 
 LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
@@ -267,7 +302,7 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             if (g_mmiLogFont[1] && ctrl != HWND_INVALID) SetWindowFont(ctrl, g_mmiLogFont[1]);
             if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
             d->state->hwnd = hWnd;
-            if (*d->start) (*d->start)(d->state->mode.load());
+            if (d->start && *d->start) (*d->start)(d->state->mode.load());
             mmi_set_current_test(d->domain);
             mmi_testwnd_start_foolproof(d->state, d->foolProofSeconds, d->domain);
             break;
@@ -281,13 +316,13 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
                 hw_stop(d);
                 tp_os_usleep(100000);
                 SendMessage(hWnd, MSG_CLOSE, 0, 0);
-                mmi_testwnd_record_pass(d->resultIndex, d->domain);
+                mmi_testwnd_pass(d);
                 return 0;
             }
             if (wParam == MMI_KEY_FAIL) {
                 hw_stop(d);
                 tp_os_usleep(100000);
-                mmi_testwnd_record_fail(d->resultIndex);
+                mmi_testwnd_fail(d);
                 SendMessage(hWnd, MSG_CLOSE, 0, 0);
                 return 0;
             }
@@ -295,14 +330,18 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
         case MSG_FAILANDQUIT:
             hw_stop(d);
             tp_os_usleep(500000);
-            mmi_testwnd_record_fail(d->resultIndex);
+            mmi_testwnd_fail(d);
             SendMessage(hWnd, MSG_CLOSE, 0, 0);
             return 0;
         case MSG_PAINT: {
             HDC hdc = BeginPaint(hWnd);
             mmi_testwnd_draw_top_line(hdc);
-            char note[MMI_TESTWND_TEXT_SIZE];
-            mmi_translate(d->noteKey, note, sizeof(note));
+            char note[MMI_TESTWND_NOTE_SIZE] = {0};
+            if (d->note) {
+                d->note(note, sizeof(note));
+            } else {
+                mmi_translate(d->noteKey, note, sizeof(note));
+            }
             SetTextColor(hdc, SysPixelIndex[kColourText]);
             SetBkMode(hdc, BM_TRANSPARENT);
             RECT rc = {w / 8, w / 15 + 10, (w / 4) * 3 + w / 8, h - (h / 15 + 10)};
@@ -325,6 +364,10 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
 }
 
 HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
+    if (d->bind && d->bind() != 0) {
+        TW_ERROR(d->domain, "%s::bind fail, test not opened", __func__);
+        return HWND_INVALID;
+    }
     d->state->mode = mode;
     HWND hWnd = mmi_testwnd_create(d->caption, mmi_testwnd_proc, reinterpret_cast<DWORD>(d));
     if (hWnd == HWND_INVALID) return hWnd;
@@ -341,7 +384,8 @@ HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
 int mmi_testwnd_close(const mmi_testwnd_desc *d) {
     d->state->mode = 0;
     HWND hWnd = d->state->hwnd.load();
-    if (hWnd != HWND_INVALID) SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    // The PC thread closes windows too: the close itself runs on the GUI thread.
+    if (hWnd != HWND_INVALID) mmi_RunOnGuiThread(close_window, hWnd);
     hw_stop(d);
     tp_os_usleep((unsigned long)d->stopEntrySleepMs * 1000UL);
     return 1;
@@ -350,7 +394,7 @@ int mmi_testwnd_close(const mmi_testwnd_desc *d) {
 int mmi_testwnd_pc_start(const mmi_testwnd_desc *d, int mode) {
     Check_AllTestWnd_Closed();
     d->state->mode = mode;
-    if (!*d->start) return 1;
+    if (!d->start || !*d->start) return 1;
     TW_DEBUG(d->domain, "%s::%s(%d) begin", __func__, d->startName, mode);
     if ((*d->start)(mode) != 0) {
         TW_DEBUG(d->domain, "%s::%s fail", __func__, d->startName);
@@ -361,7 +405,7 @@ int mmi_testwnd_pc_start(const mmi_testwnd_desc *d, int mode) {
 }
 
 int mmi_testwnd_pc_stop(const mmi_testwnd_desc *d) {
-    if (*d->stop) {
+    if (d->stop && *d->stop) {
         TW_DEBUG(d->domain, "%s::%s begin", __func__, d->stopName);
         if ((*d->stop)() != 0) {
             TW_DEBUG(d->domain, "%s::%s fail", __func__, d->stopName);
@@ -389,4 +433,14 @@ int mmi_AutoTest_VibratorTestEntry(int mode) {
 
 int mmi_AutoTest_VibratorTest_Stop_Entry(void) {
     return mmi_testwnd_pc_stop(&g_testwndTable[0]);
+}
+
+// ---- the monomer preview's hardware version ----
+
+void *mmi_testwnd_Monomer_HardwareVersionEntry(void) {
+    return mmi_testwnd_open(&g_testwndTable[1], 0);
+}
+
+int mmi_testwnd_Monomer_HardwareVersion_Stop(void) {
+    return mmi_testwnd_close(&g_testwndTable[1]);
 }

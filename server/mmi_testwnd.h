@@ -54,7 +54,15 @@ struct mmi_testwnd_desc {
     int pcStopSleepMs;     // after the PC stop entry
     mmi_testwnd_state *state;
     int (*stopEntry)(void);  // closes the window from outside
+    // Which run a pass hands over to: the automatic sequence or the monomer preview.
+    int run;
+    int (*bind)(void);                           // per-feature binder, null when none
+    void (*note)(char *out, unsigned int size);  // body text instead of noteKey, or null
 };
+
+#define MMI_TESTWND_RUN_AUTO 0
+#define MMI_TESTWND_RUN_MONOMER 1
+#define MMI_TESTWND_NOTE_SIZE 1024
 
 // Every generic test window, in one table.
 extern const mmi_testwnd_desc g_testwndTable[];
@@ -87,6 +95,9 @@ void mmi_testwnd_stop_foolproof(mmi_testwnd_state *st);
 // Pass or fail of a test: recorded and chained only while a run is active.
 void mmi_testwnd_record_pass(int resultIndex, const char *domain);
 void mmi_testwnd_record_fail(int resultIndex);
+// The same for a window of either run kind.
+void mmi_testwnd_pass(const mmi_testwnd_desc *d);
+void mmi_testwnd_fail(const mmi_testwnd_desc *d);
 
 // The fool-proof thread body; arg is the window's mmi_testwnd_state.
 void *WaitForFoolProof(void *arg);
@@ -105,3 +116,7 @@ void *mmi_testwnd_VibratorTestEntry(void);
 int mmi_testwnd_VibratorTest_Stop_Entry(void);
 int mmi_AutoTest_VibratorTestEntry(int mode);
 int mmi_AutoTest_VibratorTest_Stop_Entry(void);
+
+// The monomer preview's hardware version screen: the panel firmware, judged by the operator.
+void *mmi_testwnd_Monomer_HardwareVersionEntry(void);
+int mmi_testwnd_Monomer_HardwareVersion_Stop(void);

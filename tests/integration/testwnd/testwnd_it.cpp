@@ -412,6 +412,24 @@ TEST(DeviceList, ShowsEachItemInTheColourOfItsResultAfterARun) {
     EXPECT_EQ(0, greens(first, 0));
 }
 
+TEST(MonomerPreview, HardwareVersionShowsTheFirmwareAndHandsOverToTheNextItem) {
+    // The preview list of the image: the hardware version, then the monomer LCD (no window
+    // yet: its entry only logs).
+    Handset h({kVibrator});
+    h.dut.setConfig("FTX_TPSELF", "enable", "0");
+    ASSERT_TRUE(h.start());
+    h.key(108);
+    h.key(108);
+    h.key(28);
+    ASSERT_TRUE(h.waitActive("Hardware Version"));
+    h.idle();
+    Png shot = h.shot("monomer_hardware_version.png");
+    EXPECT_GT(shot.count(90, 100, 630, 400, light), 100);  // the firmware text
+    h.key(60);
+    EXPECT_TRUE(h.dut.waitLog("mmi_Monomer_LCDColorTestEntry: test not available yet"));
+    EXPECT_EQ(0, h.result(64));  // the preview records nothing
+}
+
 TEST(InfoScreen, ShowsTheIdentityAndThePassedAndFailedItems) {
     Handset h({kVibrator});
     ASSERT_TRUE(h.start());
