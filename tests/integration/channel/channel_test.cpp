@@ -32,8 +32,12 @@ class Channel : public ::testing::Test {
         if (pid_ == 0) {
             dup2(in[0], 0);
             close(in[1]);
-            std::string app = std::string(getenv("FTX_BUILD_DIR")) + "/tests/channel_app";
+            std::string build = getenv("FTX_BUILD_DIR");
+            std::string app = build + "/tests/channel_app";
             setenv("FTX_PC_PORT", "0", 1);
+            // The libraries are found by bare name, also under sanitizers, whose dlopen
+            // does not see the program's own search path.
+            setenv("LD_LIBRARY_PATH", (build + "/lib").c_str(), 1);
             execl(app.c_str(), app.c_str(), static_cast<char *>(nullptr));
             _exit(127);
         }
