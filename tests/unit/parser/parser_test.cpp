@@ -80,8 +80,10 @@ TEST_F(Parser, TableHasItsRowsInOrder) {
     EXPECT_STREQ("commonModule testItem close", g_atcmd_table[178].cmd);
     // Only three rows carry an action.
     int actions = 0;
-    for (const AtCmdRow &r : g_atcmd_table)
+    for (const AtCmdRow &r : g_atcmd_table) {
+        ASSERT_NE(nullptr, r.cmd);  // a missing row would leave the last one empty
         actions += r.action[0] != '\0';
+    }
     EXPECT_EQ(3, actions);
     EXPECT_STREQ(" ", g_atcmd_table[20].action);
     EXPECT_STREQ(" ", g_atcmd_table[22].action);
