@@ -1,9 +1,11 @@
 // The test-window framework and the table of tests that follow its pattern.
 #include "mmi_testwnd.h"
 
+#include <errno.h>
 #include <signal.h>
 #include <stdint.h>
 #include <string.h>
+#include <time.h>
 
 #include <vector>
 
@@ -53,13 +55,32 @@ struct OpenWindow {
 std::mutex s_openLock;
 std::vector<OpenWindow> s_open;
 
-// Ends the calling worker: SIGUSR1 is only ever sent with pthread_kill.
+// SIGUSR1, only ever sent with pthread_kill, asks the sleeping thread to end: it wakes from
+// its sleep and returns, so nothing is unwound inside the handler.
+thread_local volatile sig_atomic_t t_stopRequested;
+
 void signalHandler(int) {
-    pthread_exit(nullptr);
+    t_stopRequested = 1;
 }
 
 void install_stop_handler() {
-    signal(SIGUSR1, signalHandler);
+    struct sigaction sa;
+    memset(&sa, 0, sizeof(sa));
+    sa.sa_handler = signalHandler;
+    sigemptyset(&sa.sa_mask);
+    sigaction(SIGUSR1, &sa, nullptr);
+}
+
+// The platform's scaled sleep, cut short by SIGUSR1; false when it was.
+bool sleep_unless_stopped(unsigned long us) {
+    double scaled = (double)us * tp_os_time_scale();
+    struct timespec ts;
+    ts.tv_sec = (time_t)(scaled / 1e6);
+    ts.tv_nsec = (long)((scaled - (double)ts.tv_sec * 1e6) * 1000.0);
+    while (nanosleep(&ts, &ts) != 0) {
+        if (errno != EINTR || t_stopRequested) break;
+    }
+    return !t_stopRequested;
 }
 
 const mmi_testwnd_desc *desc_of(HWND hWnd) {
@@ -205,13 +226,18 @@ void *WaitForFoolProof(void *arg) {
     const unsigned generation = st->generation.load();
     install_stop_handler();
     TW_DEBUG(st->tag, "WaitForFoolProof begin.hwnd = %d", (int)(intptr_t)st->hwnd.load());
-    // SIGUSR1 may end the thread only while it sleeps: never while it holds a lock.
+    // SIGUSR1 reaches the thread only while it sleeps: never while it holds a lock (another
+    // part's handler in force may end the thread outright).
     sigset_t usr1;
     sigemptyset(&usr1);
     sigaddset(&usr1, SIGUSR1);
     pthread_sigmask(SIG_UNBLOCK, &usr1, nullptr);
-    tp_os_usleep((unsigned long)st->foolProofSeconds.load() * 1000000UL);
+    bool slept = sleep_unless_stopped((unsigned long)st->foolProofSeconds.load() * 1000000UL);
     pthread_sigmask(SIG_BLOCK, &usr1, nullptr);
+    if (!slept) {
+        TW_DEBUG(st->tag, "WaitForFoolProof stopped");
+        return nullptr;
+    }
 
     HWND target = HWND_INVALID;
     {
