@@ -170,7 +170,13 @@ int mmi_AutoTest_testinfo_Read(const char *command, int length, char *reply,
     unsigned char flags[MMI_TESTINFO_FLAGS_SIZE];
     memset(flags, 0, sizeof(flags));
     hw::ftx_api_GetTestInfoFlag(flags);
-    if (reply != nullptr && replySize > 0) snprintf(reply, replySize, "%d", GetSign(flags, item));
+    int value;
+    {
+        // GetSign moves the current byte, which a write in progress checks against.
+        std::lock_guard<std::mutex> lock(s_writeLock);
+        value = GetSign(flags, item);
+    }
+    if (reply != nullptr && replySize > 0) snprintf(reply, replySize, "%d", value);
     return 1;
 }
 
