@@ -40,7 +40,6 @@ std::atomic<int> s_batteryPresent{0};  // read by the sleep path under the batte
 int s_lastCharging = -1;               // battery thread only
 bool s_tempWarningShown = false;       // battery thread only
 
-const char *const kBlankPath = "/sys/class/graphics/fb0/blank";
 
 int shell_run(const char *cmd) {
     return dev_system(cmd);
