@@ -24,7 +24,12 @@ struct Sema {
     std::string name;
 };
 
-Sema g_semas[TP_OS_SEMA_MAX];
+// Never destroyed: detached threads may still wait on or post a semaphore while the
+// process runs its exit handlers.
+Sema *semas() {
+    static Sema *const table = new Sema[TP_OS_SEMA_MAX];
+    return table;
+}
 std::mutex g_semaTableLock;  // guards used/name
 
 struct ThreadStart {
@@ -85,7 +90,7 @@ extern "C" tp_os_thread_t tp_os_thread_create(const char *name, int priority, si
 extern "C" int tp_os_sema_create(int id, int initial) {
     if (id < 0 || id >= TP_OS_SEMA_MAX) return -1;
     std::lock_guard<std::mutex> table(g_semaTableLock);
-    Sema &s = g_semas[id];
+    Sema &s = semas()[id];
     std::lock_guard<std::mutex> lock(s.lock);
     s.used = true;
     s.count = initial;
@@ -94,7 +99,7 @@ extern "C" int tp_os_sema_create(int id, int initial) {
 
 extern "C" int tp_os_sema_get(int id, int timeout_ms) {
     if (id < 0 || id >= TP_OS_SEMA_MAX) return -1;
-    Sema &s = g_semas[id];
+    Sema &s = semas()[id];
     std::unique_lock<std::mutex> lock(s.lock);
     if (timeout_ms < 0) {
         s.cv.wait(lock, [&] { return s.count > 0; });
@@ -109,7 +114,7 @@ extern "C" int tp_os_sema_get(int id, int timeout_ms) {
 
 extern "C" int tp_os_sema_put(int id) {
     if (id < 0 || id >= TP_OS_SEMA_MAX) return -1;
-    Sema &s = g_semas[id];
+    Sema &s = semas()[id];
     {
         std::lock_guard<std::mutex> lock(s.lock);
         s.count++;
@@ -124,11 +129,11 @@ extern "C" int tp_os_sema_named(const char *name, int initial) {
     int freeSlot = -1;
     // Numbers from the top down, so named ones rarely meet numbered ones.
     for (int i = TP_OS_SEMA_MAX - 1; i > 0; i--) {
-        if (g_semas[i].used && g_semas[i].name == name) return i;
-        if (!g_semas[i].used && freeSlot < 0) freeSlot = i;
+        if (semas()[i].used && semas()[i].name == name) return i;
+        if (!semas()[i].used && freeSlot < 0) freeSlot = i;
     }
     if (freeSlot < 0) return -1;
-    Sema &s = g_semas[freeSlot];
+    Sema &s = semas()[freeSlot];
     std::lock_guard<std::mutex> lock(s.lock);
     s.used = true;
     s.name = name;

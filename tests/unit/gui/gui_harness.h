@@ -112,12 +112,13 @@ class GuiThread {
             MAINWINCREATE c = make_create(rc, HWND_DESKTOP, caption);
             HWND h = CreateMainWindow(&c);
             {
+                // Notified under the lock: the constructor's cv dies as soon as it sees ready.
                 std::lock_guard<std::mutex> lk(m);
                 hwnd_ = h;
                 tid_ = pthread_self();
                 ready = true;
+                cv.notify_all();
             }
-            cv.notify_all();
             if (h == HWND_INVALID) return;
             MSG msg;
             while (GetMessage(&msg, h)) {
