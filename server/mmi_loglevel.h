@@ -4,7 +4,7 @@
 
 #include <android/log.h>
 
-// 1 when entries of prio are kept under FTX_LOG_LEVEL (read once), else 0.
+// 1 when the log keeps entries of prio, else 0.
 int mmi_log_enabled(int prio);
 
 // __android_log_print at debug priority, skipped when debug entries are filtered.

@@ -22,7 +22,7 @@ namespace {
 
 std::mutex g_logLock;
 FILE *g_logFile = nullptr;
-int g_floor = -1;  // lowest priority kept; -1 until read from FTX_LOG_LEVEL
+std::atomic<int> g_floor{-1};  // lowest priority kept; -1 until read from FTX_LOG_LEVEL
 int g_toStderr = -1;
 ftx_log_capture_fn g_capture = nullptr;
 void *g_captureCtx = nullptr;
@@ -38,6 +38,15 @@ int parse_level(const char *s) {
 char prio_letter(int prio) {
     static const char letters[] = "??VDIWEFS";
     return (prio >= 2 && prio <= 8) ? letters[prio] : 'V';
+}
+
+int log_floor() {
+    int floor = g_floor.load(std::memory_order_relaxed);
+    if (floor < 0) {
+        floor = parse_level(getenv("FTX_LOG_LEVEL"));
+        g_floor.store(floor, std::memory_order_relaxed);
+    }
+    return floor;
 }
 
 // Caller holds g_logLock.
@@ -78,6 +87,12 @@ void log_reset() {
 
 }  // namespace ftxhost
 
+extern "C" int __android_log_is_loggable(int prio, const char *tag, int default_prio) {
+    (void)tag;
+    int floor = log_floor();
+    return prio >= (floor > default_prio ? floor : default_prio) ? 1 : 0;
+}
+
 extern "C" void ftx_log_set_capture(ftx_log_capture_fn fn, void *ctx) {
     std::lock_guard<std::mutex> lock(g_logLock);
     g_capture = fn;
@@ -88,7 +103,7 @@ extern "C" int __android_log_write(int prio, const char *tag, const char *text) 
     if (tag == nullptr) tag = "";
     if (text == nullptr) text = "";
     std::lock_guard<std::mutex> lock(g_logLock);
-    if (g_floor < 0) g_floor = parse_level(getenv("FTX_LOG_LEVEL"));
+    int floor = log_floor();
     if (g_toStderr < 0) {
         const char *e = getenv("FTX_LOG_STDERR");
         g_toStderr = (e != nullptr && strcmp(e, "1") == 0) ? 1 : 0;
@@ -97,7 +112,7 @@ extern "C" int __android_log_write(int prio, const char *tag, const char *text) 
     if (!msg.empty() && msg.back() == '\n') msg.pop_back();
     // The capture sees every entry whatever the floor; it must not log itself.
     if (g_capture != nullptr) g_capture(prio, tag, msg.c_str(), g_captureCtx);
-    if (prio < g_floor) return 0;
+    if (prio < floor) return 0;
     char prefix[96];
     snprintf(prefix, sizeof(prefix), "%s %5d %5d %c ", ftxhost::timestamp().c_str(),
              static_cast<int>(getpid()), static_cast<int>(syscall(SYS_gettid)), prio_letter(prio));

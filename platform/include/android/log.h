@@ -25,6 +25,8 @@ int __android_log_print(int prio, const char *tag, const char *fmt, ...)
 int __android_log_vprint(int prio, const char *tag, const char *fmt, va_list ap)
     __attribute__((format(printf, 3, 0)));
 int __android_log_write(int prio, const char *tag, const char *text);
+/* 1 when entries of prio under tag are kept (FTX_LOG_LEVEL on the host), else 0. */
+int __android_log_is_loggable(int prio, const char *tag, int default_prio);
 
 #ifdef __cplusplus
 }

@@ -48,6 +48,8 @@ TEST(AndroidLog, LevelFloorKeepsTheCaptureComplete) {
                                                                     ":" + msg);
         },
         &seen);
+    EXPECT_EQ(0, __android_log_is_loggable(ANDROID_LOG_DEBUG, "T", ANDROID_LOG_VERBOSE));
+    EXPECT_EQ(1, __android_log_is_loggable(ANDROID_LOG_ERROR, "T", ANDROID_LOG_VERBOSE));
     __android_log_print(ANDROID_LOG_DEBUG, "T", "quiet");
     __android_log_print(ANDROID_LOG_ERROR, "T", "loud\n");
     ftx_log_set_capture(nullptr, nullptr);
