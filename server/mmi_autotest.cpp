@@ -141,6 +141,16 @@ void common_start(const char *who) {
     g_autotestOps.build_list(1);
 }
 
+// An item whose window cannot be opened ends the run where it is, as a fail would (without
+// a record): the list stays usable instead of waiting for a pass that cannot come.
+void open_item(const testitem_node *item) {
+    void *w = item->entry ? item->entry() : AUTOTEST_ENTRY_FAILED;
+    if (w != AUTOTEST_ENTRY_FAILED) return;
+    AT_ERROR("%s %s could not be opened, run ended", __func__, item->config_domain);
+    g_bAutoTestRunning = 0;
+    g_autoTestMode = AUTOTEST_MODE_FULL;
+}
+
 int start_first(int mode) {
     const testitem_node *first =
         mmi_autotest_first_item(g_pTestItemListHead, mode, g_mmiPreFlag.load());
@@ -148,7 +158,7 @@ int start_first(int mode) {
         AT_DEBUG("%s no item to run", __func__);
         return -1;
     }
-    if (first->entry) first->entry();
+    open_item(first);
     return 0;
 }
 
@@ -289,7 +299,7 @@ int mmi_startNextItemTest(const char *domain) {
         current ? mmi_autotest_next_item(current, g_autoTestMode.load(), g_mmiPreFlag.load())
                 : nullptr;
     if (next) {
-        if (next->entry) next->entry();
+        open_item(next);
         return 0;
     }
     finish_run();

@@ -23,6 +23,9 @@
 
 extern std::atomic<int> g_autoTestMode;
 
+// What an item's entry returns when its window could not be made (HWND_INVALID).
+#define AUTOTEST_ENTRY_FAILED ((void *)-1)
+
 // What the sequence reaches outside itself; tests replace it.
 struct mmi_autotest_ops {
     int (*write_result)(int item, int result);  // the result record

@@ -46,6 +46,10 @@ void *e4() {
 void *e5() {
     return open_item("F");
 }
+void *e_broken() {
+    g_opened.push_back("broken");
+    return AUTOTEST_ENTRY_FAILED;
+}
 testitem_entry_fn kEntries[] = {e0, e1, e2, e3, e4, e5};
 
 class ItemList {
@@ -297,6 +301,15 @@ TEST_F(Sequence, UnknownDomainEndsTheRun) {
     EXPECT_EQ((std::vector<std::pair<int, int>>{{64, 1}}), rec.results);
     g_pTestItemListHead = nullptr;
     EXPECT_EQ(-1, mmi_startNextItemTest("A"));
+}
+
+TEST_F(Sequence, ItemThatCannotOpenEndsTheRunWithoutARecord) {
+    const_cast<testitem_node *>(list.at(2))->entry = e_broken;
+    mmi_AutoTestEntry();
+    mmi_startNextItemTest("A");
+    EXPECT_EQ((std::vector<std::string>{"A", "broken"}), g_opened);
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+    EXPECT_TRUE(rec.results.empty());
 }
 
 TEST_F(Sequence, AuxiliaryLcdEndsTheProcessBetweenTheTwoPasses) {
