@@ -129,8 +129,17 @@ struct Ch {
     int len;
 };
 
+// One converter per drawing thread, closed when the thread ends.
+struct GbConverter {
+    iconv_t cd = iconv_open("UTF-32LE", "GB18030");
+    ~GbConverter() {
+        if (cd != reinterpret_cast<iconv_t>(-1)) iconv_close(cd);
+    }
+};
+
 uint32_t gb_unit(const unsigned char *p, size_t n) {
-    thread_local iconv_t cd = iconv_open("UTF-32LE", "GB18030");
+    thread_local GbConverter conv;
+    iconv_t cd = conv.cd;
     if (cd == reinterpret_cast<iconv_t>(-1)) return 0xFFFD;
     char in[4];
     memcpy(in, p, n);
@@ -293,7 +302,7 @@ void layout(const DC *dc, const std::vector<Ch> &chars, int maxWidth, bool wrap,
     }
     if (start < chars.size() || lines.empty())
         lines.push_back(
-            Line{start, chars.size(), run_width(dc, &chars[start], chars.size() - start)});
+            Line{start, chars.size(), run_width(dc, chars.data() + start, chars.size() - start)});
 }
 
 const char *style_letters_ok(char weight, char slant, char underline, char struckout) {
