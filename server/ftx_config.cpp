@@ -47,10 +47,11 @@ bool has_prefix(const char *s, const char *prefix) {
     return strncmp(s, prefix, strlen(prefix)) == 0;
 }
 
-// Copies a found value to the caller: the old content is cleared over its own length and
-// the value's last character (the CR of the CR LF files) is left out.
+// Copies a found value to the caller: the old content is cleared over its own length (at
+// most a text buffer, should the caller's be unterminated) and the value's last character
+// (the CR of the CR LF files) is left out.
 void copy_found(char *out, const char *value) {
-    memset(out, 0, strlen(out));
+    memset(out, 0, strnlen(out, FTX_CFG_TEXT_SIZE));
     tp_os_strlcpy(out, value, strlen(value));
 }
 

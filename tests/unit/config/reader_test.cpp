@@ -23,7 +23,7 @@ class CfgLookup : public ::testing::Test {
         return Get_CfgValue(kFile, domain, key, out, def);
     }
     TempRoot root;
-    char out[FTX_CFG_TEXT_SIZE];
+    char out[FTX_CFG_TEXT_SIZE] = {};
 };
 
 TEST_F(CfgLookup, LastCharacterOfTheValueIsDropped) {
@@ -135,6 +135,13 @@ TEST_F(CfgLookup, FieldLimits) {
     EXPECT_EQ(0, lookup("[" + d255 + "]\r\nKey=1\r\n", d255.c_str(), "Key"));
     EXPECT_STREQ("1", out);
     EXPECT_EQ(-1, lookup("[" + d256 + "]\r\nKey=1\r\n", d256.c_str(), "Key"));
+}
+
+TEST_F(CfgLookup, AnUnterminatedBufferIsClearedOnlyOverItsSize) {
+    root.write(kFile, "[D]\r\nKey=12\r\n");
+    memset(out, 'x', sizeof(out));
+    EXPECT_EQ(0, Get_CfgValue(kFile, "D", "Key", out, nullptr));
+    EXPECT_STREQ("12", out);
 }
 
 TEST_F(CfgLookup, MainFileWrapperBracketsTheLookup) {
