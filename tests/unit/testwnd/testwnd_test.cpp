@@ -259,7 +259,8 @@ TEST(InfoScreen, RecordListsPassedAndFailedItemsOnly) {
     EXPECT_EQ(12, lines[1].colour);
     EXPECT_EQ(0, strncmp(lines[2].label, "316 ", 4));
     EXPECT_EQ(1, mmi_info_record_lines(flags, lines, 1));
-    GetTestItemsResult((const unsigned char *)"");  // nothing kept for the next test
+    const unsigned char none[256] = {0};
+    GetTestItemsResult(none);  // nothing kept for the next test
 }
 
 }  // namespace
