@@ -171,6 +171,12 @@ class Handset {
         key(28);
         idle();
     }
+    // Device-test list, then a row, until the window of that caption is in front.
+    bool fromList(int row, const std::string &caption) {
+        openDeviceList();
+        chooseRow(row);
+        return waitActive(caption);
+    }
     int result(int item) {
         auto r = dut.pc("testinfoMoudle testItem " + std::to_string(item) + ",read");
         EXPECT_EQ(0, r.first);
@@ -209,9 +215,7 @@ const Item kVibrator = {"FTX_VIBRATOR", 1, 0, 1};
 TEST(TestWindow, PassLabelShowsOnlyAfterTheFoolProofDelay) {
     Handset h({kVibrator}, 0.5);
     ASSERT_TRUE(h.start());
-    h.openDeviceList();
-    h.chooseRow(4);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(4, "Vibration Test"));
     Png before = h.shot("vibrator_before_delay.png");
     ASSERT_TRUE(h.dut.waitLog("WaitForFoolProof end"));
     h.idle();
@@ -230,9 +234,7 @@ TEST(TestWindow, PassLabelShowsOnlyAfterTheFoolProofDelay) {
 TEST(TestWindow, KeysOutsideARunLeaveTheRecordAlone) {
     Handset h({kVibrator}, 1.0);
     ASSERT_TRUE(h.start());
-    h.openDeviceList();
-    h.chooseRow(4);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(4, "Vibration Test"));
     // Pass works at once, long before the 3 s delay; the delay thread is ended with it.
     h.key(60);
     ASSERT_TRUE(h.waitActive("Device Test"));
@@ -255,9 +257,7 @@ const Item kCards = {"FTX_CARDS", 1, 0, 1};
 TEST(Run, PassRecordsAndOpensTheNextItem) {
     Handset h({kVibrator, kCards});
     ASSERT_TRUE(h.start());
-    h.openDeviceList();
-    h.chooseRow(0);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
     h.key(60);
     ASSERT_TRUE(h.dut.waitLog(kCardsOpened));
     EXPECT_EQ(1, h.result(316));
@@ -268,9 +268,7 @@ TEST(Run, FailRecordsMarksTheSummaryAndEndsTheRun) {
     Handset h({kVibrator, kCards});
     h.dut.setConfig("MMI", "pretest_menu_enable", "1");
     ASSERT_TRUE(h.start());
-    h.openDeviceList();
-    h.chooseRow(0);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
     h.key(61);
     ASSERT_TRUE(dut_wait_until([&] { return h.result(66) == 2; }, 5000));
     EXPECT_EQ(2, h.result(316));
@@ -287,9 +285,7 @@ TEST(Run, FullRunEndsWithThePreviewPassAndSwitchesTheMmiFlagOff) {
     Handset h({kVibrator, {"FTX_SAR", 0, 0, 1}, {"FTX_CARDS", 1, 1, 1}});
     h.dut.setConfig("MMI", "mmi_flag", "1");
     ASSERT_TRUE(h.start());
-    h.openDeviceList();
-    h.chooseRow(0);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
     h.key(60);
     ASSERT_TRUE(h.dut.waitLog("mmi_DeviceTest_Refresh open=1"));
     EXPECT_EQ(1, h.result(316));
@@ -322,9 +318,7 @@ TEST(Restore, RunResumesAfterTheLastPassAcrossAReboot) {
     h.dut.setConfig("MMI", "restore_autotest", "1");
     ASSERT_TRUE(h.start());
     EXPECT_EQ("FIRST", h.dut.read("/data/pv_autotest_latest_pass"));
-    h.openDeviceList();
-    h.chooseRow(0);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
     h.key(60);
     ASSERT_TRUE(h.dut.waitLog(kCardsOpened));
     EXPECT_EQ("FTX_VIBRATOR", h.dut.read("/data/pv_autotest_latest_pass"));
@@ -342,9 +336,7 @@ TEST(Restore, AFailRemovesBothRestoreFiles) {
     Handset h({kVibrator, kCards});
     h.dut.setConfig("MMI", "restore_autotest", "1");
     ASSERT_TRUE(h.start());
-    h.openDeviceList();
-    h.chooseRow(0);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
     h.dut.write("/data/pv_autotest_restore_flag", "");
     ASSERT_TRUE(h.dut.exists("/data/pv_autotest_latest_pass"));
     h.key(61);
@@ -435,9 +427,7 @@ TEST(InfoScreen, ShowsTheIdentityAndThePassedAndFailedItems) {
     ASSERT_TRUE(h.start());
     h.setResult(316, 1);
     h.setResult(280, 2);
-    h.openDeviceList();
-    h.chooseRow(1);
-    ASSERT_TRUE(h.waitActive("Product Information"));
+    ASSERT_TRUE(h.fromList(1, "Product Information"));
     // The IMEI arrives through the library's callback; the screen then rebuilds.
     h.idle();
     Png info = h.shot("product_information.png");
