@@ -190,6 +190,8 @@ int mmi_AutoTest_IMEI_Read(char *reply, unsigned int replySize) {
         }
         tp_os_usleep(kWaitStepUs);
     }
+    // Nothing came: the next read asks the library again.
+    s_requested = false;
     ID_ERROR("%s::no IMEI", __func__);
     return 0;
 }

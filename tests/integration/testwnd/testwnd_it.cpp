@@ -375,6 +375,17 @@ TEST(Pc, VibratorIdentityBatteryAndDialog) {
     EXPECT_EQ(0u, h.count("mmi_AutoTestEntry begin."));
 }
 
+TEST(Pc, ImeiThatDidNotComeIsAskedForAgain) {
+    Handset h({kVibrator});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.consoleOk("hw testinfo off"));
+    EXPECT_EQ(2, h.dut.pc("IMEIMoudle testItem read").first);  // after the 10 s wait, scaled
+    ASSERT_TRUE(h.dut.consoleOk("hw testinfo on"));
+    auto imei = h.dut.pc("IMEIMoudle testItem read");
+    EXPECT_EQ(0, imei.first);
+    EXPECT_EQ("860000000000001", imei.second);
+}
+
 TEST(DeviceList, ShowsEachItemInTheColourOfItsResultAfterARun) {
     // The SIM and SD rows hold results of other stations; the run passes the vibrator.
     Handset h({{"FTX_SIMCARD", 0, 0, 1}, {"FTX_SDCARD", 0, 0, 1}, kVibrator});
