@@ -375,6 +375,17 @@ TEST(Pc, VibratorIdentityBatteryAndDialog) {
     EXPECT_EQ(0u, h.count("mmi_AutoTestEntry begin."));
 }
 
+TEST(Pc, StartClosesTheOpenTestWindowFirst) {
+    Handset h({kVibrator});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.fromList(4, "Vibration Test"));
+    EXPECT_EQ(0, h.dut.pc("vibratorMoudle testItem open").first);
+    EXPECT_TRUE(h.waitActive("Device Test"));
+    std::string status = h.dut.console("hw status");
+    EXPECT_NE(std::string::npos, status.find("ftx_api_Vibrator_Test_Stop() x1"));
+    EXPECT_NE(std::string::npos, status.find("ftx_api_Vibrator_Test_Start(ms=-1) x2"));
+}
+
 TEST(Pc, ImeiThatDidNotComeIsAskedForAgain) {
     Handset h({kVibrator});
     ASSERT_TRUE(h.start());
