@@ -73,6 +73,7 @@ void install_stop_handler() {
 
 // The platform's scaled sleep, cut short by SIGUSR1; false when it was.
 bool sleep_unless_stopped(unsigned long us) {
+    if (t_stopRequested) return false;  // asked before the sleep began
     double scaled = (double)us * tp_os_time_scale();
     struct timespec ts;
     ts.tv_sec = (time_t)(scaled / 1e6);
@@ -224,8 +225,9 @@ void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam) {
 void *WaitForFoolProof(void *arg) {
     mmi_testwnd_state *st = static_cast<mmi_testwnd_state *>(arg);
     const unsigned generation = st->generation.load();
+    const char *tag = st->tag.load();
     install_stop_handler();
-    TW_DEBUG(st->tag, "WaitForFoolProof begin.hwnd = %d", (int)(intptr_t)st->hwnd.load());
+    TW_DEBUG(tag, "WaitForFoolProof begin.hwnd = %d", (int)(intptr_t)st->hwnd.load());
     // SIGUSR1 reaches the thread only while it sleeps: never while it holds a lock (another
     // part's handler in force may end the thread outright).
     sigset_t usr1;
@@ -235,7 +237,7 @@ void *WaitForFoolProof(void *arg) {
     bool slept = sleep_unless_stopped((unsigned long)st->foolProofSeconds.load() * 1000000UL);
     pthread_sigmask(SIG_BLOCK, &usr1, nullptr);
     if (!slept) {
-        TW_DEBUG(st->tag, "WaitForFoolProof stopped");
+        TW_DEBUG(tag, "WaitForFoolProof stopped");
         return nullptr;
     }
 
@@ -247,9 +249,9 @@ void *WaitForFoolProof(void *arg) {
             target = st->hwnd.load();
         }
     }
-    TW_DEBUG(st->tag, "after sleep ,WaitForFoolProof hwnd = %d", (int)(intptr_t)target);
+    TW_DEBUG(tag, "after sleep ,WaitForFoolProof hwnd = %d", (int)(intptr_t)target);
     if (target != HWND_INVALID) SendMessage(target, MSG_TIMER, MMI_TIMER_FOOLPROOF, 0);
-    TW_DEBUG(st->tag, "WaitForFoolProof end");
+    TW_DEBUG(tag, "WaitForFoolProof end");
     return nullptr;
 }
 

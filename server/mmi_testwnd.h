@@ -32,7 +32,7 @@ struct mmi_testwnd_state {
     // The fool-proof thread: its delay and log tag, the generation of the window it serves,
     // and whether it still sleeps (only then may SIGUSR1 end it).
     std::atomic<int> foolProofSeconds{0};
-    const char *tag = "FTX_MAIN";
+    std::atomic<const char *> tag{"FTX_MAIN"};
     std::mutex lock;
     pthread_t thread{};
     bool sleeping = false;
