@@ -68,6 +68,20 @@ TEST(FoolProof, ThreadEndedWhileItSleepsNeverReachesTheWindow) {
     EXPECT_FALSE(log.has("after sleep ,WaitForFoolProof"));
 }
 
+TEST(FoolProof, StopRightAfterTheStartEndsTheThreadAtOnce) {
+    LogCapture log;
+    mmi_testwnd_state st;
+    // 10000 s, scaled to 10 s: only the stop can end it within the second waited here.
+    ASSERT_EQ(0, mmi_testwnd_start_foolproof(&st, 10000, "FTX_TEST"));
+    mmi_testwnd_stop_foolproof(&st);
+    bool stopped = false;
+    for (int i = 0; i < 20 && !stopped; i++) {
+        settle();
+        stopped = log.has("WaitForFoolProof stopped");
+    }
+    EXPECT_TRUE(stopped);
+}
+
 TEST(FoolProof, ThreadWithoutAWindowWakesAndEnds) {
     LogCapture log;
     mmi_testwnd_state st;
