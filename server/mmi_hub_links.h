@@ -27,5 +27,3 @@ int wifi_status_monitor_thread_start(void);
 #define MMI_WIFI_UDP_THREAD 1
 #define MMI_WIFI_MONITOR_THREAD 2
 int mmi_wifi_probe_thread(int which);
-// Starts the thread that re-links to the PC server after a restart.
-int mmi_tcp_relink_thread_start(void);

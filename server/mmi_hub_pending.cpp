@@ -20,7 +20,6 @@ PENDING(int, MMI_WiFi_GetConfigParas, (void), 0, "DVK_FTX")
 PENDING(int, WiFiConThreadStart, (void), -1, "DVK_FTX")
 PENDING(int, wifi_close_thread, (int), 0, "DVK_FTX")
 PENDING(int, wifi_status_monitor_thread_start, (void), -1, "DVK_FTX")
-PENDING(int, mmi_tcp_relink_thread_start, (void), -1, "DVK_FTX")
 
 // Quiet ones: the hub asks these every second.
 __attribute__((weak)) int mmi_wifi_link_state(void) {

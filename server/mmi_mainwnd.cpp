@@ -24,6 +24,7 @@
 #include "mmi_bars.h"
 #include "mmi_dialog.h"
 #include "mmi_guithread.h"
+#include "AtThread.h"
 #include "mmi_hub_links.h"
 #include "mmi_menulist.h"
 #include "mmi_power.h"
@@ -756,7 +757,7 @@ int kmt_CreateMainMenuWnd(void) {
     restore_autotest();
     int rc = InitGUIIAL();
     if (rc != 0) return rc;
-    if (dev_access("/cache/Tcp_Restart.ini", R_OK) == 0) mmi_tcp_relink_thread_start();
+    mmi_start_tcp_relink(hWnd);  // only when /cache/Tcp_Restart.ini is readable
     return run_loop(hWnd);
 }
 
