@@ -1071,35 +1071,38 @@ HWND GetHosting(HWND h) {
     return w->host != nullptr ? static_cast<HWND>(w->host) : HWND_DESKTOP;
 }
 
-BOOL GetClientRect(HWND h, PRECT prc) {
+extern "C++" {
+namespace {
+
+// A window's rectangle as pick gives it, or the whole screen for the desktop.
+template <typename Pick>
+BOOL query_rect(HWND h, PRECT prc, Pick pick) {
     if (prc == nullptr) return FALSE;
     std::lock_guard<std::mutex> lk(g_lock);
     Window *w = as_window_locked(h);
     if (w == nullptr) {
-        if (h == HWND_DESKTOP) {
-            *prc = screen_rect();
-            return TRUE;
-        }
-        return FALSE;
+        if (h != HWND_DESKTOP) return FALSE;
+        *prc = screen_rect();
+        return TRUE;
     }
-    RECT r = client_screen_rect_locked(w);
-    SetRect(prc, 0, 0, r.right - r.left, r.bottom - r.top);
+    *prc = pick(w);
     return TRUE;
 }
 
+}  // namespace
+}  // extern "C++"
+
+BOOL GetClientRect(HWND h, PRECT prc) {
+    return query_rect(h, prc, [](Window *w) {
+        RECT r = client_screen_rect_locked(w);
+        RECT out;
+        SetRect(&out, 0, 0, r.right - r.left, r.bottom - r.top);
+        return out;
+    });
+}
+
 BOOL GetWindowRect(HWND h, PRECT prc) {
-    if (prc == nullptr) return FALSE;
-    std::lock_guard<std::mutex> lk(g_lock);
-    Window *w = as_window_locked(h);
-    if (w == nullptr) {
-        if (h == HWND_DESKTOP) {
-            *prc = screen_rect();
-            return TRUE;
-        }
-        return FALSE;
-    }
-    *prc = w->rc;
-    return TRUE;
+    return query_rect(h, prc, [](Window *w) { return w->rc; });
 }
 
 void ClientToScreen(HWND h, int *x, int *y) {
