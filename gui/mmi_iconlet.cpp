@@ -3,6 +3,7 @@
 
 #include <string.h>
 
+#include <algorithm>
 #include <vector>
 
 namespace {
@@ -26,6 +27,38 @@ void repaint(HWND h, IconLet *d) {
     if (!d->locked) InvalidateRect(h, nullptr, TRUE);
 }
 
+// Where each item's text goes. A centred text wider than its slot (a long title) spreads
+// into the room its neighbours' texts leave free instead of being cut at the slot's edges.
+std::vector<RECT> text_boxes(HDC hdc, const IconLet *d, int width, int height) {
+    size_t n = d->items.size();
+    std::vector<RECT> boxes(n);
+    std::vector<int> inkLeft(n), inkRight(n);
+    for (size_t i = 0; i < n; i++) {
+        const ICONLET_ITEM &it = d->items[i];
+        boxes[i] = {it.x, 0, it.x + it.width, height};
+        SIZE size = {0, 0};
+        if (it.text[0] != '\0') GetTextExtent(hdc, it.text, -1, &size);
+        int centre = it.x + it.width / 2;
+        inkLeft[i] = size.cx > 0 ? centre - size.cx / 2 : centre;
+        inkRight[i] = size.cx > 0 ? centre + (size.cx + 1) / 2 : centre;
+    }
+    if (d->align != ICONLET_ALIGN_CENTER) return boxes;
+    for (size_t i = 0; i < n; i++) {
+        const ICONLET_ITEM &it = d->items[i];
+        if (inkRight[i] - inkLeft[i] <= it.width) continue;
+        int left = 0, right = width;
+        for (size_t j = 0; j < n; j++) {
+            if (j == i || inkRight[j] == inkLeft[j]) continue;  // an empty neighbour
+            if (d->items[j].x < it.x) left = std::max(left, std::min(inkRight[j], it.x));
+            if (d->items[j].x > it.x)
+                right = std::min(right, std::max(inkLeft[j], it.x + it.width));
+        }
+        boxes[i].left = std::max(left, inkLeft[i]);
+        boxes[i].right = std::min(right, inkRight[i]);
+    }
+    return boxes;
+}
+
 void paint(HWND h, IconLet *d) {
     HDC hdc = BeginPaint(h);
     RECT rc;
@@ -36,13 +69,14 @@ void paint(HWND h, IconLet *d) {
     UINT fmt = DT_SINGLELINE | DT_VCENTER | DT_NOPREFIX;
     if (d->align == ICONLET_ALIGN_CENTER) fmt |= DT_CENTER;
     if (d->align == ICONLET_ALIGN_RIGHT) fmt |= DT_RIGHT;
-    for (const ICONLET_ITEM &it : d->items) {
-        RECT box = {it.x, 0, it.x + it.width, RECTH(rc)};
+    std::vector<RECT> boxes = text_boxes(hdc, d, RECTW(rc), RECTH(rc));
+    for (size_t i = 0; i < d->items.size(); i++) {
+        const ICONLET_ITEM &it = d->items[i];
         if (it.slot == d->pressed) {
             SetBrushColor(hdc, SysPixelIndex[d->skin.pressedBkColour]);
-            FillBox(hdc, box.left, box.top, RECTW(box), RECTH(box));
+            FillBox(hdc, it.x, 0, it.width, RECTH(rc));
         }
-        DrawText(hdc, it.text, -1, &box, fmt);
+        DrawText(hdc, it.text, -1, &boxes[i], fmt);
     }
     EndPaint(h, hdc);
 }

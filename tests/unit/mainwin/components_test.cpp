@@ -237,6 +237,35 @@ TEST(BarTest, TitleStripByIndexSettersCheckIndexAndOwner) {
     EXPECT_EQ(tp_batteryshow_destroy(), 1);
 }
 
+TEST(BarTest, ALongTitleSpreadsIntoFreeRoomInsteadOfBeingCut) {
+    ASSERT_TRUE(RegisterIconLetCtrl());
+    GuiThread gui(RECT{0, 40, kW, kH - 63});
+    RECT strip = {0, 0, kW, 42};
+    ASSERT_EQ(svr_create_batteryshow(gui.hwnd(), &strip, 1), 1);
+    const char *title = "Product information of the handset";
+    ASSERT_EQ(tp_batteryshow_set_text_items(gui.hwnd(), "", title, ""), 1);
+    ASSERT_EQ(tp_batteryshow_update(gui.hwnd()), 1);
+    ASSERT_TRUE(idle());
+    RECT leftThird = {0, 0, kW / 3, 42};
+    EXPECT_GT(count_not(leftThird, pixel(0, 1)), 0);  // the title reaches past its slot
+
+    // A right text keeps its room: it looks the same beside a long title as beside a short one.
+    auto rightThird = [&] {
+        EXPECT_EQ(tp_batteryshow_update(gui.hwnd()), 1);
+        EXPECT_TRUE(idle());
+        std::vector<Uint32> px;
+        for (int y = 0; y < 42; y++)
+            for (int x = kW - kW / 6 - 10; x < kW; x++)
+                px.push_back(pixel(x, y));
+        return px;
+    };
+    ASSERT_EQ(tp_batteryshow_set_text_items(gui.hwnd(), "", "T", "88%"), 1);
+    auto beside_short = rightThird();
+    ASSERT_EQ(tp_batteryshow_set_text_items(gui.hwnd(), "", title, "88%"), 1);
+    EXPECT_EQ(beside_short, rightThird());
+    EXPECT_EQ(tp_batteryshow_destroy(), 1);
+}
+
 TEST(BarTest, SlotsAreThirdsOfTheWidth) {
     EXPECT_EQ(tp_bar_slot_at(0, 720), 0);
     EXPECT_EQ(tp_bar_slot_at(239, 720), 0);
