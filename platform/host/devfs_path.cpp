@@ -9,11 +9,11 @@
 
 #include <mutex>
 #include <string>
-#include <vector>
 
 #include "devfs.h"
 #include "ftx_host.h"
 #include "host_internal.h"
+#include "shell_line.h"
 
 namespace {
 
@@ -50,33 +50,11 @@ extern "C" const char *dev_root(void) {
 
 extern "C" int dev_path(const char *path, char *out, size_t size) {
     if (path == nullptr || out == nullptr || size == 0) return -1;
-    std::string result;
-    if (path[0] != '/') {
-        result = path;
-    } else {
-        // Resolve "." and ".." lexically so that no device path leaves the root.
-        std::vector<std::string> parts;
-        const char *p = path;
-        while (*p != '\0') {
-            while (*p == '/')
-                p++;
-            const char *start = p;
-            while (*p != '\0' && *p != '/')
-                p++;
-            std::string part(start, p - start);
-            if (part.empty() || part == ".") continue;
-            if (part == "..") {
-                if (!parts.empty()) parts.pop_back();
-                continue;
-            }
-            parts.push_back(part);
-        }
-        result = dev_root();
-        for (const std::string &part : parts)
-            result += "/" + part;
-        size_t len = strlen(path);
-        if (len > 1 && path[len - 1] == '/') result += "/";
-    }
+    // "." and ".." are resolved lexically, so no device path leaves the root; a relative path
+    // is taken from the handset's working directory, "/".
+    std::string device = ftxhost::normalise_device_path(path);
+    std::string result = dev_root();
+    if (device != "/") result += device;
     if (result.size() + 1 > size) {
         out[0] = '\0';
         return -1;

@@ -5,6 +5,8 @@
 #include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/mount.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -18,6 +20,7 @@
 #include "devfs.h"
 #include "ftx_host.h"
 #include "host_internal.h"
+#include "shell_line.h"
 
 extern char **environ;
 
@@ -25,11 +28,8 @@ namespace {
 
 std::mutex g_shellLogLock;
 std::atomic<ftx_reboot_hook_fn> g_rebootHook{nullptr};
-
-// Characters after which a '/' starts a path word in a shell line.
-bool starts_word(char prev) {
-    return strchr(" \t'\"=<>|;&(`", prev) != nullptr;
-}
+// The system partition is mounted read-only at boot, as on a handset.
+std::atomic<bool> g_systemWritable{false};
 
 void record(const std::string &line) {
     std::lock_guard<std::mutex> lock(g_shellLogLock);
@@ -45,47 +45,70 @@ void record(const std::string &line) {
 
 }  // namespace
 
-// Moves every absolute device path of a shell line into the device root.
-std::string ftx_map_shell_line(const char *cmd) {
-    std::string root = dev_root();
-    std::string out;
-    size_t n = strlen(cmd);
-    for (size_t i = 0; i < n; i++) {
-        char c = cmd[i];
-        if (c == '/' && (i == 0 || starts_word(cmd[i - 1])) &&
-            strncmp(cmd + i, root.c_str(), root.size()) != 0 &&
-            strncmp(cmd + i, "/dev/null", 9) != 0) {
-            out += root;
-        }
-        out += c;
-    }
-    return out;
+namespace {
+
+const char *tool_dir() {
+    return FTX_HANDSET_TOOL_DIR;
+}
+
+ftxhost::ShellContext shell_context() {
+    ftxhost::ShellContext ctx;
+    ctx.root = dev_root();
+    ctx.toolDir = tool_dir();
+    ctx.hasTool = [](const std::string &name) {
+        std::string p = std::string(tool_dir()) + "/" + name;
+        return access(p.c_str(), X_OK) == 0;
+    };
+    ctx.deviceHas = [](const std::string &devicePath) {
+        struct stat st;
+        char buf[4096];
+        return dev_path(devicePath.c_str(), buf, sizeof(buf)) == 0 && lstat(buf, &st) == 0;
+    };
+    return ctx;
+}
+
+}  // namespace
+
+extern "C" int ftx_shell_prepare(const char *line, char *out, size_t size) {
+    if (line == nullptr || out == nullptr || size == 0) return -1;
+    std::string prepared, why;
+    int rc = ftxhost::shell_prepare(line, shell_context(), &prepared, &why);
+    snprintf(out, size, "%s", rc == 0 ? prepared.c_str() : why.c_str());
+    return rc;
 }
 
 extern "C" int dev_system(const char *cmd) {
     if (cmd == nullptr) return 1;  // a shell is available
     record(cmd);
-    std::string line = ftx_map_shell_line(cmd);
+    std::string line, why;
+    if (ftxhost::shell_prepare(cmd, shell_context(), &line, &why) != 0) {
+        record("refused: " + why);
+        __android_log_print(ANDROID_LOG_ERROR, "PLATFORM", "dev_system: refused \"%s\": %s", cmd,
+                            why.c_str());
+        return W_EXITCODE(127, 0);
+    }
     std::string root = dev_root();
-    const char *oldPath = getenv("PATH");
-    std::string path = "PATH=" + root + "/system/bin:" + root +
-                       "/system/xbin:" + (oldPath != nullptr ? oldPath : "/usr/bin:/bin");
-    std::string rootVar = "FTX_ROOT=" + root;
-
     std::vector<std::string> env;
     for (char **e = environ; *e != nullptr; e++) {
         if (strncmp(*e, "PATH=", 5) != 0 && strncmp(*e, "FTX_ROOT=", 9) != 0) env.push_back(*e);
     }
-    env.push_back(path);
-    env.push_back(rootVar);
+    // Only the build's tools are found by name; the root's files never run.
+    env.push_back(std::string("PATH=") + tool_dir());
+    env.push_back("FTX_ROOT=" + root);
     std::vector<char *> envp;
     for (std::string &s : env)
         envp.push_back(s.data());
     envp.push_back(nullptr);
 
+    // The handset's shell starts in "/": relative paths of the tools land in the root.
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    posix_spawn_file_actions_addchdir_np(&actions, root.c_str());
     const char *argv[] = {"sh", "-c", line.c_str(), nullptr};
     pid_t pid;
-    int rc = posix_spawn(&pid, "/bin/sh", nullptr, nullptr, const_cast<char **>(argv), envp.data());
+    int rc =
+        posix_spawn(&pid, "/bin/sh", &actions, nullptr, const_cast<char **>(argv), envp.data());
+    posix_spawn_file_actions_destroy(&actions);
     if (rc != 0) {
         errno = rc;
         return -1;
@@ -132,5 +155,23 @@ extern "C" int dev_mount(const char *source, const char *target, const char *fst
                        (target ? target : "-") + " " + (fstype ? fstype : "-") +
                        " flags=" + std::to_string(flags);
     record(line);
+    std::string where = ftxhost::normalise_device_path(target != nullptr ? target : "");
+    if (where == "/system" || where == "/system/") {
+        if ((flags & MS_RDONLY) != 0) {
+            g_systemWritable = false;
+        } else if ((flags & MS_REMOUNT) != 0) {
+            g_systemWritable = true;
+        }
+    }
     return 0;
 }
+
+extern "C" int ftx_host_system_writable(void) {
+    return g_systemWritable.load() ? 1 : 0;
+}
+
+namespace ftxhost {
+void mounts_reset() {
+    g_systemWritable = false;
+}
+}  // namespace ftxhost

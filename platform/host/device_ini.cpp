@@ -63,6 +63,7 @@ extern "C" int ftx_device_ini_get_int(const char *section, const char *key, int 
 
 extern "C" void ftx_host_reset(void) {
     ftxhost::root_reset();
+    ftxhost::mounts_reset();
     ftxhost::properties_reset();
     ftxhost::device_ini_reset();
     ftxhost::log_reset();

@@ -10,6 +10,7 @@ void device_ini_reset();
 void properties_reset();
 void log_reset();
 void root_reset();
+void mounts_reset();
 
 // Current wall time as "MM-DD HH:MM:SS.mmm".
 std::string timestamp();

@@ -25,9 +25,9 @@ extern "C" {
 /* The device root folder (no trailing slash). */
 const char *dev_root(void);
 
-/* Maps a device path into the device root. Absolute paths are normalised
- * ("." and ".." resolved, never above the root) and prefixed with the root;
- * relative paths are copied unchanged. Returns 0, or -1 when out is too small. */
+/* Maps a device path into the device root: "." and ".." are resolved (never above the
+ * root), a relative path is taken from the handset's working directory "/", and the root
+ * is put in front. Returns 0, or -1 when out is too small. */
 int dev_path(const char *path, char *out, size_t size);
 
 FILE *dev_fopen(const char *path, const char *mode);
@@ -39,7 +39,10 @@ int dev_unlink(const char *path);
 int dev_rename(const char *from, const char *to);
 DIR *dev_opendir(const char *path);
 
-/* Runs a device shell line and returns its wait status as system() does. */
+/* Runs a device shell line and returns its wait status as system() does. The handset's
+ * tools it names are the build's own programs (never files of the device root), its paths
+ * are taken inside the root, and a line that would run anything else is refused with
+ * exit status 127 and an error in the log. */
 int dev_system(const char *cmd);
 
 /* Powers off or reboots (cmd is a LINUX_REBOOT_CMD_...). Never returns on the host. */

@@ -28,6 +28,14 @@ void ftx_set_reboot_hook(ftx_reboot_hook_fn fn);
 void ftx_host_reset(void);
 
 
+/* 1 once the system partition was remounted writable (dev_mount with MS_REMOUNT on
+ * "/system"), else 0: the root's "/system" is read-only to the PC's file operations. */
+int ftx_host_system_writable(void);
+
+/* What dev_system would hand the host shell for line (0), or why it would refuse it (-1);
+ * either text goes to out. For tests and the fuzzer. */
+int ftx_shell_prepare(const char *line, char *out, size_t size);
+
 /* Simulated hardware control lines ("hw ..." on the emulator console). Each simulated
  * library exports ftx_sim_control(line, reply, size) and registers it when loaded.
  * The function gets the line without the "hw " prefix and returns 0 when it handled

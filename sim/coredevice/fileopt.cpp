@@ -15,6 +15,7 @@
 #include "android/log.h"
 #include "channel.h"
 #include "devfs.h"
+#include "ftx_host.h"
 #include "hw/libdvk_ncoredevice.h"
 #include "sim_core.h"
 
@@ -24,11 +25,14 @@ namespace {
 const char kTag[] = "DVK_FILEOPT";
 const size_t kMaxPath = 1024;
 
+bool under(const std::string &path, const std::string &folder) {
+    return path.compare(0, folder.size(), folder) == 0 &&
+           (path.size() == folder.size() || path[folder.size()] == '/');
+}
+
 bool inside_root(const std::string &real) {
     char root[PATH_MAX];
-    if (realpath(dev_root(), root) == nullptr) return false;
-    size_t n = strlen(root);
-    return real.compare(0, n, root) == 0 && (real.size() == n || real[n] == '/');
+    return realpath(dev_root(), root) != nullptr && under(real, root);
 }
 
 // The real path of path's folder must be inside the root, and so must path itself when it
@@ -77,13 +81,49 @@ bool to_size(const std::string &s, size_t *v) {
     return true;
 }
 
-// Makes the folders above host, inside the root.
-bool make_parents(const std::string &host) {
-    std::string root = dev_root();
-    for (size_t i = root.size() + 1; i < host.size(); ++i) {
-        if (host[i] != '/') continue;
-        std::string part = host.substr(0, i);
-        if (mkdir(part.c_str(), 0755) != 0 && errno != EEXIST) return false;
+// Where host's folder really is: its deepest existing part resolved through every link, the
+// rest as written (the caller has refused ".." parts).
+std::string landing(const std::string &folder) {
+    std::string path = folder, rest;
+    while (true) {
+        char real[PATH_MAX];
+        if (realpath(path.c_str(), real) != nullptr) return real + rest;
+        size_t slash = path.rfind('/');
+        if (slash == std::string::npos || slash == 0) return "/" + path.substr(slash + 1) + rest;
+        rest = path.substr(slash) + rest;
+        path = path.substr(0, slash);
+    }
+}
+
+// The checks that come before anything is made or changed for a write or a remove: the
+// path lands inside the root, and not on the system partition while it is read-only.
+bool may_change(const std::string &host, std::string *where, std::string *reason) {
+    char root[PATH_MAX];
+    if (realpath(dev_root(), root) == nullptr) {
+        *reason = "no device root";
+        return false;
+    }
+    // The last part itself is not followed: a write never goes through a link, and a remove
+    // takes the link away, not what it points to.
+    size_t slash = host.rfind('/');
+    *where = landing(host.substr(0, slash)) + host.substr(slash);
+    if (!under(*where, root)) {
+        *reason = "path leaves the device root";
+        return false;
+    }
+    if (under(*where, std::string(root) + "/system") && !ftx_host_system_writable()) {
+        *reason = "read-only file system";
+        return false;
+    }
+    return true;
+}
+
+// Makes the missing folders above where, a path that may_change accepted.
+bool make_parents(const std::string &where) {
+    size_t slash = where.rfind('/');
+    for (size_t i = 1; i <= slash; ++i) {
+        if (where[i] != '/') continue;
+        if (mkdir(where.substr(0, i).c_str(), 0755) != 0 && errno != EEXIST) return false;
     }
     return true;
 }
@@ -217,12 +257,15 @@ int fileopt_write(const std::string &parm, char *reply, size_t size) {
     bool append = !path.empty() && path[0] == '+';
     if (append) path.erase(0, 1);
     if (!fileopt_unescape(data, &bytes)) return fail(reply, size, path, "bad escape in data");
-    if (!fileopt_confine(path, &host, &reason)) {
-        // The folder may be missing: make it when the rest of the path is acceptable.
-        if (reason != "no such folder") return fail(reply, size, path, reason);
-        if (!make_parents(host) || !fileopt_confine(path, &host, &reason)) {
-            return fail(reply, size, path, reason);
-        }
+    std::string where;
+    bool confined = fileopt_confine(path, &host, &reason);
+    // The folder may be missing: it is made only where the path really lands, and only
+    // after that place was checked.
+    if (!confined && reason != "no such folder") return fail(reply, size, path, reason);
+    if (!may_change(host, &where, &reason)) return fail(reply, size, path, reason);
+    if (!confined) {
+        if (!make_parents(where)) return fail(reply, size, path, strerror(errno));
+        if (!fileopt_confine(path, &host, &reason)) return fail(reply, size, path, reason);
     }
     struct stat st;
     if (stat(host.c_str(), &st) == 0 && !S_ISREG(st.st_mode)) {
@@ -253,6 +296,8 @@ int fileopt_write(const std::string &parm, char *reply, size_t size) {
 int fileopt_remove(const std::string &parm, char *reply, size_t size) {
     std::string host, reason;
     if (!fileopt_confine(parm, &host, &reason)) return fail(reply, size, parm, reason);
+    std::string where;
+    if (!may_change(host, &where, &reason)) return fail(reply, size, parm, reason);
     struct stat st;
     if (lstat(host.c_str(), &st) != 0) return fail(reply, size, parm, strerror(errno));
     int rc = S_ISDIR(st.st_mode) ? rmdir(host.c_str()) : unlink(host.c_str());

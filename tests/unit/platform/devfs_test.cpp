@@ -1,13 +1,15 @@
 #include <fcntl.h>
+#include <sys/mount.h>
 #include <sys/wait.h>
 #include <unistd.h>
+
+#include <vector>
 
 #include <gtest/gtest.h>
 
 #include "devfs.h"
+#include "ftx_host.h"
 #include "support/temp_root.h"
-
-std::string ftx_map_shell_line(const char *cmd);
 
 namespace {
 
@@ -24,7 +26,9 @@ TEST(DevPath, AbsolutePathsStayInsideTheRoot) {
     EXPECT_EQ(root.path() + "/etc/passwd", mapped("/data/../../../etc/passwd"));
     EXPECT_EQ(root.path() + "/a/c", mapped("//a/./b/../c"));
     EXPECT_EQ(root.path(), mapped("/.."));
-    EXPECT_EQ("relative/x", mapped("relative/x"));
+    // A relative path is taken from the handset's working directory, "/".
+    EXPECT_EQ(root.path() + "/relative/x", mapped("relative/x"));
+    EXPECT_EQ(root.path() + "/escaped/", mapped("../escaped/"));
 
     char tiny[8];
     EXPECT_EQ(-1, dev_path("/etc/ftx_config.ini", tiny, sizeof(tiny)));
@@ -55,35 +59,144 @@ TEST(DevPath, FileCallsWorkOnTheRoot) {
     EXPECT_NE(0, dev_access("/data/x.txt", F_OK));
 }
 
-TEST(DevSystem, DevicePathsAreMovedIntoTheRoot) {
-    TempRoot root;
-    const std::string r = root.path();
-    EXPECT_EQ("echo 1 > " + r + "/sys/class/leds/x",
-              ftx_map_shell_line("echo 1 > /sys/class/leds/x"));
-    EXPECT_EQ("toybox chmod 777 " + r + "/data/a;ls '" + r + "/b'",
-              ftx_map_shell_line("toybox chmod 777 /data/a;ls '/b'"));
-    EXPECT_EQ("cmd 2>/dev/null", ftx_map_shell_line("cmd 2>/dev/null"));
-    EXPECT_EQ("wget http://h/x a/b", ftx_map_shell_line("wget http://h/x a/b"));
-    // A path already inside the root is left as it is.
-    std::string inside = "cat " + r + "/etc/x";
-    EXPECT_EQ(inside, ftx_map_shell_line(inside.c_str()));
+std::string prepared(const std::string &line) {
+    char out[1024];
+    int rc = ftx_shell_prepare(line.c_str(), out, sizeof(out));
+    return (rc == 0 ? "" : "refused: ") + std::string(out);
 }
 
-TEST(DevSystem, RunsTheRootsToolsFirstAndRecordsEveryLine) {
+const std::string kTools = FTX_TEST_BUILD_DIR "/handset/bin";
+
+TEST(DevSystem, PathsAreTakenInsideTheRootAndToolsFromTheBuild) {
     TempRoot root;
-    root.write("/system/bin/toybox",
-               "#!/bin/sh\necho \"toybox $*\" > \"$FTX_ROOT/data/toybox.out\"\n");
+    const std::string r = root.path();
+    EXPECT_EQ("'echo' '1' >'" + r + "/sys/class/leds/x'", prepared("echo 1 > /sys/class/leds/x"));
+    EXPECT_EQ("'" + kTools + "/toybox' 'chmod' '777' '" + r + "/data/a' ; '" + kTools + "/ls' '" +
+                  r + "/b c'",
+              prepared("toybox chmod 777 /data/a;ls '/b c'"));
+    EXPECT_EQ("'" + kTools + "/rm' '" + r + "/etc/passwd'",
+              prepared("rm /data/../../../etc/passwd"));
+    EXPECT_EQ("'" + kTools + "/insmod' '" + r + "/vendor/lib/modules/wlan.ko' 'con_mode=5'",
+              prepared("insmod /vendor/lib/modules/wlan.ko con_mode=5"));
+    EXPECT_EQ("'" + kTools + "/cat' 'if=" + r + "/x' 2>/dev/null 2>&1 >>'" + r + "/log/y'",
+              prepared("cat if=/x 2>/dev/null 2>&1 >> log/y"));
+    EXPECT_EQ("'echo' '-n' 'FIRST' >'" + r + "/data/pv_autotest_latest_pass'",
+              prepared("echo -n FIRST > /data/pv_autotest_latest_pass"));
+    EXPECT_EQ("'echo' 'it'\\''s' && 'true' || 'exit' '3' &",
+              prepared("echo \"it's\" && true || exit 3 &"));
+
+    // A tool named by its handset path runs the build's tool, and only when the handset has
+    // that file.
+    EXPECT_EQ("refused: /system/bin/iwpriv: not found", prepared("/system/bin/iwpriv wlan0"));
+    root.write("/system/bin/iwpriv", "data only");
+    EXPECT_EQ("'" + kTools + "/iwpriv' 'wlan0'", prepared("/system/bin/iwpriv wlan0"));
+    EXPECT_EQ("'" + kTools + "/iwpriv'", prepared("/system/bin/../bin/./iwpriv"));
+}
+
+TEST(DevSystem, LinesThatWouldRunAnythingElseAreRefused) {
+    TempRoot root;
+    root.write("/system/bin/evil", "#!/bin/sh\n");
+    root.write("/data/x.sh", "#!/bin/sh\n");
+    for (const char *line : {"/system/bin/evil",
+                             "/data/x.sh",
+                             "/usr/bin/id",
+                             "evil",
+                             "sh -c id",
+                             "bash",
+                             ". /data/x.sh",
+                             "source /data/x.sh",
+                             "eval id",
+                             "exec /data/x.sh",
+                             "command -p id",
+                             "env id",
+                             "PATH=/system/bin evil",
+                             "echo $(id)",
+                             "echo `id`",
+                             "echo \"$HOME\"",
+                             "echo $HOME",
+                             "cat /data/*",
+                             "cat <<EOF",
+                             "echo > ",
+                             "echo 'open",
+                             "echo \\",
+                             "toybox; ../x",
+                             "true >&/data/x",
+                             "if true; then id; fi",
+                             "{ id; }",
+                             "x=1",
+                             "./x.sh",
+                             "iwpriv | sh"}) {
+        EXPECT_EQ(0u, prepared(line).rfind("refused: ", 0)) << line << " -> " << prepared(line);
+    }
+    // Refused lines run nothing and say why.
+    int status = dev_system("/data/x.sh");
+    ASSERT_TRUE(WIFEXITED(status));
+    EXPECT_EQ(127, WEXITSTATUS(status));
+    EXPECT_NE(std::string::npos,
+              root.read("/log/shell.txt")
+                  .find("refused: /data/x.sh: not a folder of the handset's tools"));
+}
+
+TEST(DevSystem, RunsTheBuildsToolsNeverTheRootsAndRecordsEveryLine) {
+    TempRoot root;
+    // A script planted where the handset keeps its toybox.
+    root.write("/system/bin/toybox", "#!/bin/sh\ntouch \"$FTX_ROOT/data/planted\"\n");
     chmod(root.host("/system/bin/toybox").c_str(), 0755);
     std::filesystem::create_directories(root.host("/data"));
-    int status = dev_system("toybox touch /data/flag");
-    ASSERT_TRUE(WIFEXITED(status));
-    EXPECT_EQ(0, WEXITSTATUS(status));
-    EXPECT_EQ("toybox touch " + root.path() + "/data/flag\n", root.read("/data/toybox.out"));
+    for (const char *line :
+         {"toybox touch /data/flag", "/system/bin/toybox touch /data/flag2", "touch data/flag3"}) {
+        int status = dev_system(line);
+        ASSERT_TRUE(WIFEXITED(status)) << line;
+        EXPECT_EQ(0, WEXITSTATUS(status)) << line;
+    }
+    EXPECT_TRUE(root.exists("/data/flag"));
+    EXPECT_TRUE(root.exists("/data/flag2"));
+    EXPECT_TRUE(root.exists("/data/flag3")) << "the shell starts in the root";
+    EXPECT_FALSE(root.exists("/data/planted"));
+    std::string tools = root.read("/log/tools.txt");
+    EXPECT_NE(std::string::npos, tools.find("toybox touch /data/flag\n")) << tools;
 
     EXPECT_EQ(3, WEXITSTATUS(dev_system("exit 3")));
     std::string shell = root.read("/log/shell.txt");
     EXPECT_NE(std::string::npos, shell.find(" toybox touch /data/flag\n"));
     EXPECT_NE(std::string::npos, shell.find(" exit 3\n"));
+}
+
+TEST(DevSystem, FileAppletsStayInsideTheRoot) {
+    TempRoot root;
+    std::string outside = root.path() + "-outside";
+    std::filesystem::create_directories(outside);
+    root.write("/data/keep", "x");
+    std::filesystem::create_directories(root.host("/data/links"));
+    symlink(outside.c_str(), root.host("/data/links/out").c_str());
+    for (const std::string &line :
+         std::vector<std::string>{"rm -rf ../" + std::filesystem::path(outside).filename().string(),
+                                  "toybox touch ../escaped", "touch data/links/out/x",
+                                  "toybox cp data/keep data/links/out/copy",
+                                  "rm --no-preserve-root=/ data", "toybox ls .."}) {
+        int status = dev_system(line.c_str());
+        EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) != 0) << line;
+    }
+    EXPECT_TRUE(std::filesystem::exists(outside));
+    EXPECT_TRUE(std::filesystem::is_empty(outside));
+    EXPECT_FALSE(std::filesystem::exists(root.path() + "/../escaped"));
+    EXPECT_TRUE(root.exists("/data/keep"));
+    // Machine-changing applets are only recorded.
+    EXPECT_EQ(0, WEXITSTATUS(dev_system("toybox ifconfig lo up")));
+    EXPECT_NE(std::string::npos, root.read("/log/tools.txt").find("toybox ifconfig lo up\n"));
+    std::filesystem::remove_all(outside);
+}
+
+TEST(DevMount, TheSystemPartitionIsWritableOnlyAfterARemount) {
+    TempRoot root;
+    EXPECT_EQ(0, ftx_host_system_writable());
+    dev_mount("/dev/block/bootdevice/by-name/system", "/system/", "ext4", MS_REMOUNT, nullptr);
+    EXPECT_EQ(1, ftx_host_system_writable());
+    dev_mount("/dev/block/bootdevice/by-name/system", "/system", "ext4", MS_REMOUNT | MS_RDONLY,
+              nullptr);
+    EXPECT_EQ(0, ftx_host_system_writable());
+    dev_mount("/dev/block/bootdevice/by-name/data", "/data", "ext4", MS_REMOUNT, nullptr);
+    EXPECT_EQ(0, ftx_host_system_writable());
 }
 
 int g_rebootStatus = 0;

@@ -1,4 +1,5 @@
 // The "FileOptMoudle" operations: formats, and that no parameter reaches outside the root.
+#include <sys/mount.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -7,6 +8,7 @@
 
 #include <gtest/gtest.h>
 
+#include "devfs.h"
 #include "fileopt.h"
 #include "support/temp_root.h"
 
@@ -106,6 +108,9 @@ TEST_F(FileOpt, NothingEscapesTheRoot) {
         EXPECT_EQ(read(bad).rfind("ERROR", 0), 0u) << bad;
         EXPECT_EQ(write(std::string(bad) + ",pwned").rfind("ERROR", 0), 0u) << bad;
     }
+    // No folder is made before the place it lands in was checked.
+    EXPECT_EQ(write("/data/links/outdir/new/sub/f,x"), "ERROR path leaves the device root");
+    EXPECT_FALSE(std::filesystem::exists(outside + "/new"));
     EXPECT_EQ(read("/data/links/in"), "*inside") << "a link that stays inside is followed";
     EXPECT_EQ(write("/data/links/in,changed"), "ERROR will not write through a symbolic link");
     EXPECT_EQ(remove("/data/links/outdir/secret").rfind("ERROR", 0), 0u);
@@ -119,6 +124,27 @@ TEST_F(FileOpt, NothingEscapesTheRoot) {
     EXPECT_STREQ(buf, "secret");
     EXPECT_EQ(root_.read(outside + "/secret"), "pwned");
     std::filesystem::remove_all(outside);
+}
+
+TEST_F(FileOpt, TheSystemPartitionIsReadOnlyUntilRemounted) {
+    root_.write("/system/bin/iwpriv", "data");
+    std::filesystem::create_directories(root_.host("/data"));
+    symlink(root_.host("/system/bin").c_str(), root_.host("/data/sysbin").c_str());
+    for (const char *p : {"/system/bin/iwpriv", "/system/bin/new/tool", "/data/sysbin/iwpriv",
+                          "/system/x", "+/system/bin/iwpriv"}) {
+        EXPECT_EQ(write(std::string(p) + ",#!/bin/sh"), "ERROR read-only file system") << p;
+    }
+    EXPECT_EQ(remove("/system/bin/iwpriv"), "ERROR read-only file system");
+    EXPECT_EQ(remove("/system"), "ERROR read-only file system");
+    EXPECT_EQ(root_.read("/system/bin/iwpriv"), "data");
+    EXPECT_FALSE(root_.exists("/system/bin/new"));
+    EXPECT_EQ(read("/system/bin/iwpriv"), "*data") << "reading stays allowed";
+    EXPECT_EQ(remove("/data/sysbin"), "*removed") << "the link goes, not what it points to";
+
+    dev_mount("/dev/block/bootdevice/by-name/system", "/system", "ext4", MS_REMOUNT, nullptr);
+    EXPECT_EQ(write("/system/bin/iwpriv,changed"), "*7");
+    EXPECT_EQ(write("/system/bin/new/tool,x"), "*1");
+    EXPECT_EQ(remove("/system/bin/new/tool"), "*removed");
 }
 
 }  // namespace
