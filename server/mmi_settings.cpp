@@ -70,6 +70,22 @@ const BatteryField kBatteryFields[] = {
      "%s g_cSysBacklight=%s"},
 };
 
+// A path setting must name a place on the handset: absolute, without ".." parts or control
+// bytes. Anything else is refused with an error and the built-in path used instead.
+void check_path_setting(const char *key, char *value, const char *builtin) {
+    bool ok = value[0] == '/';
+    for (const char *p = value; ok && *p != '\0'; p++) {
+        if (static_cast<unsigned char>(*p) < 0x20 || *p == 0x7f) ok = false;
+        if (p[0] == '/' && p[1] == '.' && p[2] == '.' && (p[3] == '/' || p[3] == '\0')) ok = false;
+    }
+    if (ok) return;
+    __android_log_print(ANDROID_LOG_ERROR, "FTX_CONFIG",
+                        "%s %s %s is not an absolute path on the handset: using %s",
+                        "mmi_initconfig", key, value, builtin);
+    memset(value, 0, MMI_TEXT_SIZE);
+    tp_os_strlcpy(value, builtin, MMI_TEXT_SIZE);
+}
+
 void read_battery_fields(const ftx_config_para *paras, int count) {
     char work[MMI_TEXT_SIZE];
     for (const BatteryField &f : kBatteryFields) {
@@ -78,6 +94,7 @@ void read_battery_fields(const ftx_config_para *paras, int count) {
         if (f.textTarget != nullptr) {
             memset(f.textTarget, 0, MMI_TEXT_SIZE);
             tp_os_strlcpy(f.textTarget, work, MMI_TEXT_SIZE);
+            check_path_setting(f.name, f.textTarget, f.def);
             CFG_DEBUG(f.line, "mmi_initconfig", f.textTarget);
             continue;
         }
@@ -108,6 +125,7 @@ void join_path(char *dst, const char *prefix, const char *suffix) {
 bool read_log_path() {
     memset(g_chLogPath, 0, sizeof(g_chLogPath));
     if (Read_MainCfgFile("MMI", "LogPath", g_chLogPath, "/cache/ftx/") != 0) return false;
+    check_path_setting("LogPath", g_chLogPath, "/cache/ftx/");
     CFG_DEBUG("%s,L%d:: g_chLogPath=%s", "mmi_initconfig", 1016, g_chLogPath);
     size_t len = strlen(g_chLogPath);
     if (len > 0 && g_chLogPath[len - 1] != '/' && len < MMI_TEXT_SIZE - 1) {
