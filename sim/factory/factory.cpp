@@ -65,7 +65,12 @@ extern "C" int ftx_api_LCD_Get_Info(int *width, int *height, int *bpp) {
 }
 SIM_PLAIN(ftx_api_LCD_Off)
 SIM_INT(ftx_api_LCD_Refresh, arg)
-SIM_INT(ftx_api_ftx_mode_init, mode)
+extern "C" int ftx_api_ftx_mode_init(int mode) {
+    // The library starts here: a write cut short by a kill in an earlier run left its
+    // temporary behind.
+    ftxsim::flags_clear_stale();
+    return call("ftx_api_ftx_mode_init", 0, "mode=%d", mode);
+}
 SIM_PLAIN(ftx_api_ftx_mode_uninit)
 
 extern "C" int ftx_api_Get_TestInfo(ftx_api_module_cb cb) {

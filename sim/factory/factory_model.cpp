@@ -329,10 +329,11 @@ int w_flags(const Args &a, Reply &r) {
         int shift = (3 - static_cast<int>(i % 4)) * 2;
         if (a.size() == 4) {
             if (!to_int(a[3], &v) || v < 0 || v > 3) return 1;
-            flags_load(f);
-            unsigned char b = f[i / 4];
-            b = static_cast<unsigned char>((b & ~(3 << shift)) | (v << shift));
-            if (flags_write_byte(static_cast<int>(i / 4), b) != 0) return 1;
+            // Under the area's lock: the item's neighbours may be written at the same time.
+            if (flags_update(static_cast<int>(i / 4), static_cast<unsigned char>(3 << shift),
+                             static_cast<unsigned char>(v << shift)) != 0) {
+                return r.add("cannot write the flag area"), 1;
+            }
         }
         flags_load(f);
         r.add("item %ld = %d\n", i, (f[i / 4] >> shift) & 3);

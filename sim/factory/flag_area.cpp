@@ -1,11 +1,17 @@
 #include "flag_area.h"
 
+#include <dirent.h>
+#include <errno.h>
 #include <fcntl.h>
+#include <signal.h>
 #include <stdio.h>
+#include <stdlib.h>
 #include <string.h>
 #include <unistd.h>
 
 #include <sys/stat.h>
+
+#include <android/log.h>
 
 #include <mutex>
 #include <string>
@@ -16,9 +22,11 @@
 namespace ftxsim {
 namespace {
 
+const char kTag[] = "FTX_FLAGS";
 const char kFolder[] = "/sim";
 const char kPath[] = "/sim/testinfo_flags.bin";
-std::mutex g_flagsLock;
+const char kTmpPrefix[] = "testinfo_flags.bin.";  // then the writer's PID and ".tmp"
+std::mutex g_flagsLock;                           // held across every change of the area
 
 // The last area read or written, with the identity of the file it came from. Every store
 // renames a new file into place, so an unchanged inode and time mean unchanged bytes and a
@@ -61,6 +69,53 @@ bool write_all(int fd, const unsigned char *p, size_t n) {
     return true;
 }
 
+int store_failed(const char *step, const char *path, int err) {
+    __android_log_print(ANDROID_LOG_ERROR, kTag, "cannot store the flag area: %s %s: %s", step,
+                        path, strerror(err));
+    return -1;
+}
+
+// Caller holds g_flagsLock.
+int store_locked(const unsigned char *flags) {
+    dev_mkdir(kFolder, 0755);
+    char tmp[64];
+    snprintf(tmp, sizeof(tmp), "%s.%d.tmp", kPath, static_cast<int>(getpid()));
+    int fd = dev_open(tmp, O_WRONLY | O_CREAT | O_TRUNC, 0644);
+    if (fd < 0) return store_failed("create", tmp, errno);
+    int err = 0;
+    if (!write_all(fd, flags, FTX_TESTINFO_FLAGS_SIZE) || fsync(fd) != 0) err = errno;
+    if (close(fd) != 0 && err == 0) err = errno;
+    if (err == 0 && dev_rename(tmp, kPath) != 0) err = errno;
+    if (err != 0) {
+        dev_unlink(tmp);
+        return store_failed("write", kPath, err);
+    }
+    int dir = dev_open(kFolder, O_RDONLY | O_DIRECTORY);
+    if (dir >= 0) {
+        fsync(dir);
+        close(dir);
+    }
+    std::string path = host_path();
+    struct stat st;
+    std::lock_guard<std::mutex> lock(g_cache.lock);
+    if (!path.empty() && stat(path.c_str(), &st) == 0) {
+        remember(st, path, flags);
+    } else {
+        g_cache.valid = false;
+    }
+    return 0;
+}
+
+// The PID of a temporary's name, or 0 when the name is not one of ours.
+pid_t tmp_owner(const char *name) {
+    size_t prefix = sizeof(kTmpPrefix) - 1;
+    if (strncmp(name, kTmpPrefix, prefix) != 0) return 0;
+    char *end = nullptr;
+    long pid = strtol(name + prefix, &end, 10);
+    if (end == name + prefix || strcmp(end, ".tmp") != 0 || pid <= 0) return 0;
+    return static_cast<pid_t>(pid);
+}
+
 }  // namespace
 
 void flags_load(unsigned char *flags) {
@@ -86,40 +141,42 @@ void flags_load(unsigned char *flags) {
 }
 
 int flags_store(const unsigned char *flags) {
-    dev_mkdir(kFolder, 0755);
-    char tmp[64];
-    snprintf(tmp, sizeof(tmp), "%s.%d.tmp", kPath, static_cast<int>(getpid()));
-    int fd = dev_open(tmp, O_WRONLY | O_CREAT | O_TRUNC, 0644);
-    if (fd < 0) return -1;
-    bool ok = write_all(fd, flags, FTX_TESTINFO_FLAGS_SIZE) && fsync(fd) == 0;
-    close(fd);
-    if (!ok || dev_rename(tmp, kPath) != 0) {
-        dev_unlink(tmp);
-        return -1;
-    }
-    int dir = dev_open(kFolder, O_RDONLY | O_DIRECTORY);
-    if (dir >= 0) {
-        fsync(dir);
-        close(dir);
-    }
-    std::string path = host_path();
-    struct stat st;
-    std::lock_guard<std::mutex> lock(g_cache.lock);
-    if (!path.empty() && stat(path.c_str(), &st) == 0) {
-        remember(st, path, flags);
-    } else {
-        g_cache.valid = false;
-    }
-    return 0;
+    std::lock_guard<std::mutex> lock(g_flagsLock);
+    return store_locked(flags);
 }
 
-int flags_write_byte(int index, unsigned char value) {
+int flags_update(int index, unsigned char mask, unsigned char bits) {
     if (index < 0 || index >= FTX_TESTINFO_FLAGS_SIZE) return -1;
     std::lock_guard<std::mutex> lock(g_flagsLock);
     unsigned char flags[FTX_TESTINFO_FLAGS_SIZE];
     flags_load(flags);
-    flags[index] = value;
-    return flags_store(flags);
+    flags[index] = static_cast<unsigned char>((flags[index] & ~mask) | (bits & mask));
+    return store_locked(flags);
+}
+
+int flags_write_byte(int index, unsigned char value) {
+    return flags_update(index, 0xFF, value);
+}
+
+int flags_clear_stale() {
+    DIR *dir = dev_opendir(kFolder);
+    if (dir == nullptr) return 0;
+    int removed = 0;
+    std::lock_guard<std::mutex> lock(g_flagsLock);
+    while (struct dirent *e = readdir(dir)) {
+        pid_t owner = tmp_owner(e->d_name);
+        if (owner == 0) continue;
+        // Our own is left from an earlier life of this PID; a live other may be writing.
+        if (owner != getpid() && (kill(owner, 0) == 0 || errno == EPERM)) continue;
+        std::string path = std::string(kFolder) + "/" + e->d_name;
+        if (dev_unlink(path.c_str()) == 0) {
+            removed++;
+            __android_log_print(ANDROID_LOG_WARN, kTag, "removed %s left by an ended writer",
+                                path.c_str());
+        }
+    }
+    closedir(dir);
+    return removed;
 }
 
 }  // namespace ftxsim

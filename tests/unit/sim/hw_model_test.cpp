@@ -4,7 +4,9 @@
 #include <unistd.h>
 
 #include <atomic>
+#include <barrier>
 #include <chrono>
+#include <filesystem>
 #include <condition_variable>
 #include <mutex>
 #include <string>
@@ -17,6 +19,7 @@
 #include "hw/lib_dvk_signalcoupling.h"
 #include "hw/lib_factory.h"
 #include "support/temp_root.h"
+#include "unit/config/log_capture.h"
 
 namespace {
 
@@ -125,6 +128,84 @@ TEST_F(FactoryModel, ConsoleLinesDriveTheFlagArea) {
     EXPECT_EQ(rc, 1);
     hw("flags set 3 256", &rc);
     EXPECT_EQ(rc, 1);
+}
+
+TEST_F(FactoryModel, ConsoleItemWritesNeverUndoOtherWriters) {
+    // One thread per item of byte 1, all writing at once, round after round; between
+    // rounds each checks that its item holds what it wrote. A console item is set under the
+    // area's lock. A library writer, as the application writing a PC result, reads the area
+    // and writes the whole byte, which may undo anyone (the handset's interface allows
+    // that), so with one in the game only its own item is checked.
+    auto item_of = [](int item) { return (flag_byte(1) >> ((3 - item % 4) * 2)) & 3; };
+    auto run = [&](int libraryItem) {
+        std::atomic<int> lost{0};
+        std::barrier round(4);
+        std::vector<std::thread> threads;
+        for (int item = 4; item < 8; item++) {
+            threads.emplace_back([&, item] {
+                int shift = (3 - item % 4) * 2;
+                for (int i = 0; i < 15; i++) {
+                    int value = 1 + (i + item) % 2;
+                    if (item != libraryItem) {
+                        hw("flags item " + std::to_string(item) + " " + std::to_string(value));
+                    } else {
+                        unsigned char flags[FTX_TESTINFO_FLAGS_SIZE];
+                        ftx_api_GetTestInfoFlag(flags);
+                        unsigned char b = flags[1];
+                        b = static_cast<unsigned char>((b & ~(3 << shift)) | (value << shift));
+                        ftx_api_WriteFuncTestInfoFlags(1, b);
+                    }
+                    round.arrive_and_wait();
+                    bool checked = libraryItem < 0 || item == libraryItem;
+                    if (checked && item_of(item) != value) lost++;
+                    round.arrive_and_wait();
+                }
+            });
+        }
+        for (auto &t : threads)
+            t.join();
+        return lost.load();
+    };
+    EXPECT_EQ(0, run(-1)) << "console writes undid each other";
+    EXPECT_EQ(0, run(6)) << "a console write undid a result written through the library";
+}
+
+TEST_F(FactoryModel, StartClearsTheTemporariesOfEndedWriters) {
+    pid_t ended = fork();
+    if (ended == 0) _exit(0);
+    waitpid(ended, nullptr, 0);
+    auto tmp = [](long pid) { return "/sim/testinfo_flags.bin." + std::to_string(pid) + ".tmp"; };
+    const std::string dead = tmp(ended), mine = tmp(getpid()), live = tmp(1);
+    for (const std::string &f : {dead, mine, live, std::string("/sim/testinfo_flags.bin.x.tmp")})
+        root_.write(f, "half");
+    ASSERT_EQ(0, ftx_api_WriteFuncTestInfoFlags(3, 0x40));
+    EXPECT_FALSE(root_.exists(mine)) << "a store replaces its own temporary";
+    root_.write(mine, "half");
+
+    ftx_api_ftx_mode_init(0);
+    EXPECT_FALSE(root_.exists(dead));
+    EXPECT_FALSE(root_.exists(mine)) << "nothing of this process writes at its start";
+    EXPECT_TRUE(root_.exists(live)) << "a running writer keeps its temporary";
+    EXPECT_TRUE(root_.exists("/sim/testinfo_flags.bin.x.tmp")) << "not a writer's name";
+    EXPECT_EQ(flag_byte(3), 0x40);
+}
+
+TEST_F(FactoryModel, AFailedStoreIsAnErrorAndKeepsNoTemporary) {
+    ASSERT_EQ(0, ftx_api_WriteFuncTestInfoFlags(0, 0x40));
+    // A folder in the file's place: every rename over it fails.
+    std::filesystem::remove(root_.host("/sim/testinfo_flags.bin"));
+    root_.write("/sim/testinfo_flags.bin/keep", "");
+    LogCapture log;
+    EXPECT_NE(0, ftx_api_WriteFuncTestInfoFlags(1, 0x10));
+    EXPECT_TRUE(log.has("E FTX_FLAGS: cannot store the flag area: write /sim/testinfo_flags.bin:"));
+    int rc = 0;
+    EXPECT_EQ("cannot write the flag area", hw("flags item 5 1", &rc));
+    EXPECT_EQ(1, rc);
+    hw("flags clear", &rc);
+    EXPECT_EQ(1, rc);
+    EXPECT_EQ(flag_byte(1), 0);
+    for (const auto &e : std::filesystem::directory_iterator(root_.host("/sim")))
+        EXPECT_NE(".tmp", e.path().extension()) << e.path();
 }
 
 TEST_F(FactoryModel, ForcedAnswersAndStatus) {
