@@ -33,6 +33,7 @@ struct Battery {
     int forcedStatus = 0;  // 0: derived from the chargers and the level
     int lowLevel = 15;
     int periodMs = 1000;
+    unsigned long rounds = 0;  // rounds whose callbacks have all returned: tests wait on it
 };
 
 Battery &bat() {
@@ -93,6 +94,7 @@ void service_loop(unsigned generation) {
             }
         }
         lk.lock();
+        ++b.rounds;
         b.cv.wait_for(lk, period, [&] { return !b.running || b.generation != generation; });
     }
 }
@@ -109,10 +111,10 @@ void battery_state(Reply &r) {
     const FTX_BATTERY_INFO &i = b.info;
     r.add(
         "battery: service=%s observers=%zu level=%d voltage=%d temperature=%d status=%d "
-        "health=%d present=%d charging=%s low=%d\n",
+        "health=%d present=%d charging=%s low=%d rounds=%lu\n",
         b.running ? "running" : "stopped", b.observers.size(), i.batteryLevel, i.batteryVoltage,
         i.batteryTemperature, derived_status(b), i.batteryHealth, i.batteryPresent,
-        b.chargingEnabled ? "enabled" : "disabled", b.lowLevel);
+        b.chargingEnabled ? "enabled" : "disabled", b.lowLevel, b.rounds);
     r.add("charger: ac=%d usb=%d wireless=%d\n", i.chargerAcOnline, i.chargerUsbOnline,
           i.chargerWirelessOnline);
 }
@@ -151,19 +153,25 @@ int battery_word(const Args &a, Reply &r) {
 }
 
 int charger_word(const Args &a, Reply &r) {
-    long v;
     Battery &b = bat();
     std::lock_guard<std::mutex> lock(b.lock);
     FTX_BATTERY_INFO &i = b.info;
     if (a.size() == 2 && a[1] == "none") {
         i.chargerAcOnline = i.chargerUsbOnline = i.chargerWirelessOnline = 0;
-    } else if (a.size() == 3 && to_int(a[2], &v) && (v == 0 || v == 1)) {
-        unsigned char *flag = a[1] == "ac"         ? &i.chargerAcOnline
-                              : a[1] == "usb"      ? &i.chargerUsbOnline
-                              : a[1] == "wireless" ? &i.chargerWirelessOnline
-                                                   : nullptr;
-        if (flag == nullptr) return 1;
-        *flag = static_cast<unsigned char>(v);
+    } else if (a.size() >= 3 && a.size() % 2 == 1) {
+        // Several pairs change at once, so one line can swap chargers without a round
+        // seeing none (or both) online in between.
+        FTX_BATTERY_INFO next = i;
+        for (size_t k = 1; k < a.size(); k += 2) {
+            long v;
+            unsigned char *flag = a[k] == "ac"         ? &next.chargerAcOnline
+                                  : a[k] == "usb"      ? &next.chargerUsbOnline
+                                  : a[k] == "wireless" ? &next.chargerWirelessOnline
+                                                       : nullptr;
+            if (flag == nullptr || !to_int(a[k + 1], &v) || (v != 0 && v != 1)) return 1;
+            *flag = static_cast<unsigned char>(v);
+        }
+        i = next;
     } else {
         return 1;
     }

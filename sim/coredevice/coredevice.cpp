@@ -30,7 +30,7 @@ const Word kWords[] = {
      "level 0..100 | temperature TENTHS_C | voltage MV | health 1..7 | present 0|1 | "
      "status 1..5|auto | low LEVEL | period MS",
      battery_word},
-    {"charger", "ac|usb|wireless 0|1 | none", charger_word},
+    {"charger", "ac|usb|wireless 0|1 [...] | none", charger_word},
     {"wifilink", "ok|fail  (whether the Wi-Fi-to-PC link switch works)", wifilink_word},
 };
 

@@ -275,6 +275,33 @@ bool DeviceUnderTest::waitLog(const std::string &text, int timeoutMs) const {
     return dut_wait_until([&] { return logPos(text) != std::string::npos; }, timeoutMs);
 }
 
+size_t DeviceUnderTest::logCount(const std::string &text) const {
+    std::string log = logcat();
+    size_t n = 0;
+    for (size_t p = log.find(text); p != std::string::npos; p = log.find(text, p + text.size()))
+        n++;
+    return n;
+}
+
+bool DeviceUnderTest::waitLogCount(const std::string &text, size_t n, int timeoutMs) const {
+    return dut_wait_until([&] { return logCount(text) >= n; }, timeoutMs);
+}
+
+long DeviceUnderTest::batteryRounds() const {
+    std::string s = console("hw status");
+    size_t p = s.find(" rounds=");
+    return p == std::string::npos ? -1 : atol(s.c_str() + p + 8);
+}
+
+bool DeviceUnderTest::waitBatteryRounds(long n, int timeoutMs) {
+    long from = batteryRounds();
+    if (from < 0) return false;
+    // One round may be under way: it could have begun before what the caller just did.
+    return dut_wait_until([&] { return !running() || batteryRounds() >= from + n + 1; },
+                          timeoutMs) &&
+           running();
+}
+
 bool DeviceUnderTest::running() {
     if (pid_ <= 0) return false;
     int st;

@@ -57,6 +57,17 @@ class DeviceUnderTest {
     bool waitLog(const std::string &text, int timeoutMs = 10000) const;
     // Index of text in the log, or npos.
     size_t logPos(const std::string &text) const;
+    // How many times text is in the log; waits until it is there at least n times.
+    size_t logCount(const std::string &text) const;
+    bool waitLogCount(const std::string &text, size_t n, int timeoutMs = 10000) const;
+
+    // Rounds of the battery service whose observer callbacks have all returned (-1 when the
+    // console does not tell). The application's idle check runs once a round, so "n more
+    // rounds" is the condition to wait on where a rule must have had its chance to act.
+    long batteryRounds() const;
+    // Waits until n rounds after the current one have ended; false when the process ended
+    // first or time ran out.
+    bool waitBatteryRounds(long n, int timeoutMs = 20000);
 
     bool running();
     // Waits for the process to end: its exit status, or -1 on time-out (still running).

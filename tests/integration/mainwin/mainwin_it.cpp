@@ -3,19 +3,16 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
+#include <chrono>
 #include <filesystem>
+#include <functional>
 #include <string>
-#include <thread>
 
 #include "support/device_under_test.h"
 
 namespace fs = std::filesystem;
 
 namespace {
-
-void pause_ms(int ms) {
-    std::this_thread::sleep_for(std::chrono::milliseconds(ms));
-}
 
 // Makes the named library unloadable: an empty file of that name comes first on the
 // library path (the build's own folder is the executable's run path, so a library
@@ -42,6 +39,10 @@ bool in_order(const std::string &log, const std::vector<std::string> &lines) {
 
 // The dialog of the main window on 720x1280: 630 x 426 at (45, 427).
 const char *const kDialogRect = "rect=45,427,675,853";
+const char kDoModal[] = "1203 Dialog DoModal=1";
+// The power key (scan code 1) going down and up, as the dialog's key hook logs it.
+const char kDialogPowerDown[] = "1203 Dialog hookKeyProc enter,msg=16,wparam=1,";
+const char kDialogPowerUp[] = "1203 Dialog hookKeyProc enter,msg=18,wparam=1,";
 
 TEST(StartupTest, FullApplicationStartsInOrder) {
     for (const char *mode : {"normal", "", "unset", "ffbm-00"}) {
@@ -117,6 +118,13 @@ class RunningTest : public ::testing::Test {
         ASSERT_TRUE(dut_.waitLog("TitleInfoShow begin"));
     }
     std::string windows() { return dut_.console("windows"); }
+    // Holds the power key until `until` holds (what the press must bring about), then lets
+    // it go; false when that never came.
+    bool holdPower(const std::function<bool()> &until) {
+        if (!dut_.consoleOk("key down 1")) return false;
+        bool seen = dut_wait_until(until, 10000);
+        return dut_.consoleOk("key up 1") && seen;
+    }
     DeviceUnderTest dut_;
 };
 
@@ -131,18 +139,17 @@ TEST_F(RunningTest, MenuGeometryAndRows) {
     ASSERT_TRUE(dut_.consoleOk("tap 300 " + std::to_string(58 + 96 * 4 + 48)));
     ASSERT_TRUE(dut_.waitLog("ScrollViewProc choose 4"));
     EXPECT_EQ(dut_.logPos("ScrollViewProc choose 5"), std::string::npos);  // five rows only
-    // By keys: down then Enter.
+    // By keys: down then Enter chooses a row once more.
     ASSERT_TRUE(dut_.consoleOk("key press 108"));
     ASSERT_TRUE(dut_.consoleOk("key press 28"));
-    EXPECT_TRUE(dut_.waitLog("ScrollViewProc choose"));
+    EXPECT_TRUE(dut_.waitLogCount("ScrollViewProc choose", 3));
     std::string log = dut_.logcat();
     EXPECT_TRUE(in_order(log, {"mmi_CurrentWnd_ReadConfig,L", "g_bAgingTest=1."}));
 }
 
 TEST_F(RunningTest, ShortPowerKeyTogglesSleep) {
-    ASSERT_TRUE(dut_.consoleOk("key down 1"));
-    pause_ms(300);
-    ASSERT_TRUE(dut_.consoleOk("key up 1"));
+    // Down and up in one request: a short press however busy the machine is.
+    ASSERT_TRUE(dut_.consoleOk("key press 1"));
     ASSERT_TRUE(dut_.waitLog("SetSleepStatus end"));
     EXPECT_EQ(dut_.read("/sys/class/leds/lcd-backlight/brightness"), "0");
     EXPECT_EQ(dut_.read("/sys/class/graphics/fb0/blank").substr(0, 1), "4");
@@ -153,46 +160,46 @@ TEST_F(RunningTest, ShortPowerKeyTogglesSleep) {
 }
 
 TEST_F(RunningTest, LongPowerKeyAsksAndPowersOff) {
-    ASSERT_TRUE(dut_.consoleOk("key down 1"));
-    pause_ms(1000);
-    ASSERT_TRUE(dut_.consoleOk("key up 1"));
-    ASSERT_TRUE(dut_.waitLog("1203 Dialog DoModal=1"));
+    ASSERT_TRUE(holdPower([&] { return dut_.logCount(kDoModal) == 1; }));
     EXPECT_NE(windows().find(kDialogRect), std::string::npos);
-    // A second long press while the dialog is up opens nothing more: the dialog has the keys.
-    ASSERT_TRUE(dut_.consoleOk("key down 1"));
-    pause_ms(1000);
-    ASSERT_TRUE(dut_.consoleOk("key up 1"));
-    pause_ms(200);
-    std::string log = dut_.logcat();
-    const std::string created = "CreateDialog enter";
-    EXPECT_EQ(log.find(created, log.find(created) + created.size()), std::string::npos);
+    // A second long press while the dialog is up opens nothing more: the dialog has the
+    // keys. The key is held well past the long-press time, so a press that reached the
+    // menu's hook would have acted by the time the dialog saw the key go up.
+    auto start = std::chrono::steady_clock::now();
+    ASSERT_TRUE(holdPower([&] {
+        return dut_.logPos(kDialogPowerDown) != std::string::npos &&
+               std::chrono::steady_clock::now() - start > std::chrono::milliseconds(1500);
+    }));
+    ASSERT_TRUE(dut_.waitLog(kDialogPowerUp));
+    EXPECT_EQ(1u, dut_.logCount("CreateDialog enter"));
+    EXPECT_EQ(0u, dut_.logCount("g_dialogcouldshow=0,thead_exit"));
     ASSERT_TRUE(dut_.consoleOk("key press 60"));
     EXPECT_EQ(dut_.wait(10000), 100);
+    EXPECT_NE(dut_.logPos("mmi_PowerOffEntry begin"), std::string::npos);
 }
 
 TEST_F(RunningTest, PcClosesTheDialogAndTheSecondButtonKeepsRunning) {
-    ASSERT_TRUE(dut_.consoleOk("key down 1"));
-    pause_ms(1000);
-    ASSERT_TRUE(dut_.consoleOk("key up 1"));
-    ASSERT_TRUE(dut_.waitLog("1203 Dialog DoModal=1"));
+    ASSERT_TRUE(holdPower([&] { return dut_.logCount(kDoModal) == 1; }));
     EXPECT_EQ(dut_.pc("CloseDialog testItem start").first, 0);
     EXPECT_TRUE(
         dut_wait_until([&] { return windows().find(kDialogRect) == std::string::npos; }, 5000));
     // Open again and answer with the second button (key 61): no power-off.
-    ASSERT_TRUE(dut_.consoleOk("key down 1"));
-    pause_ms(1000);
-    ASSERT_TRUE(dut_.consoleOk("key up 1"));
-    ASSERT_TRUE(
-        dut_wait_until([&] { return windows().find(kDialogRect) != std::string::npos; }, 5000));
+    ASSERT_TRUE(holdPower([&] { return dut_.logCount(kDoModal) == 2; }));
+    EXPECT_NE(windows().find(kDialogRect), std::string::npos);
     ASSERT_TRUE(dut_.consoleOk("key press 61"));
     EXPECT_TRUE(
         dut_wait_until([&] { return windows().find(kDialogRect) == std::string::npos; }, 5000));
-    EXPECT_EQ(dut_.wait(1500), -1);  // still running
+    // The button's action runs on the GUI thread right after the dialog is gone.
+    ASSERT_TRUE(dut_.waitLogCount("DestroyDialog end", 2));
+    ASSERT_TRUE(dut_.consoleOk("idle 5000"));
+    EXPECT_EQ(dut_.logPos("mmi_PowerOffEntry begin"), std::string::npos);
+    EXPECT_TRUE(dut_.running());
 }
 
 TEST_F(RunningTest, BatteryTemperatureWarnsThenPowersOff) {
+    ASSERT_TRUE(dut_.consoleOk("hw battery period 100"));
     ASSERT_TRUE(dut_.consoleOk("hw battery temperature 449"));
-    pause_ms(2500);
+    ASSERT_TRUE(dut_.waitBatteryRounds(2));  // the application has seen 449 at least once
     EXPECT_EQ(dut_.logPos("battery Temperature Warning"), std::string::npos);
     ASSERT_TRUE(dut_.consoleOk("hw battery temperature 450"));
     EXPECT_TRUE(dut_.waitLog("battery Temperature Warning,current Temperature=450"));
@@ -201,8 +208,12 @@ TEST_F(RunningTest, BatteryTemperatureWarnsThenPowersOff) {
     EXPECT_NE(dut_.logPos("g_powerofftemp = 600"), std::string::npos);
 }
 
-// Idle rules with the times configured short and the clock scaled by FTX_TIME_SCALE 0.1:
-// 20 s of idle sleep in 2 s, the power-off 30 s (3 s) after.
+// Idle rules with the times configured short and the clock scaled by FTX_TIME_SCALE 0.05:
+// 20 s of idle sleep in 1 s, the power-off 30 s (1.5 s) after. The battery service calls
+// once a (scaled) second, and every call runs the idle check, so 35 rounds after a fresh
+// count are always past the turn-off time, however slowly the machine runs them.
+const long kPastTurnOff = 35;
+
 class IdleTest : public ::testing::Test {
   protected:
     void start(const std::string &osIdle) {
@@ -210,33 +221,57 @@ class IdleTest : public ::testing::Test {
                        "lowvolt_threshold:30;powerofftemp:600;OSIdle:" + osIdle +
                            ";OS_AutoSleepTime:20;OS_AutoTurnOffTime:30;sys_backlight:/sys/class/"
                            "leds/lcd-backlight/brightness");
-        dut_.setEnv("FTX_TIME_SCALE", "0.1");
+        dut_.setEnv("FTX_TIME_SCALE", "0.05");
         ASSERT_TRUE(dut_.startToMenu());
     }
+    void hw(const std::string &line) { ASSERT_TRUE(dut_.consoleOk("hw " + line)) << line; }
     DeviceUnderTest dut_;
 };
 
 TEST_F(IdleTest, SleepsThenPowersOffWhenNotCharging) {
     start("1");
-    ASSERT_TRUE(dut_.consoleOk("hw charger none"));
-    ASSERT_TRUE(dut_.consoleOk("hw battery status 3"));
+    hw("charger none");
+    hw("battery status 3");
     ASSERT_TRUE(dut_.waitLog("SetSleepStatus end", 15000));
     EXPECT_EQ(dut_.read("/sys/class/leds/lcd-backlight/brightness"), "0");
     EXPECT_EQ(dut_.wait(15000), 100);
+    EXPECT_NE(dut_.logPos("AutoSleepCheck idle="), std::string::npos);
 }
 
-TEST_F(IdleTest, ChargingKeepsTheDeviceOn) {
+TEST_F(IdleTest, ChargingKeepsTheDeviceOnWithOrWithoutACharger) {
     start("1");
-    ASSERT_TRUE(dut_.consoleOk("hw battery status 2"));
+    hw("battery status 2");
     ASSERT_TRUE(dut_.waitLog("SetSleepStatus end", 15000));
-    EXPECT_EQ(dut_.wait(6000), -1);  // two turn-off times later it still runs
+    ASSERT_TRUE(dut_.waitBatteryRounds(kPastTurnOff));
+    // Charging counts by itself, whatever the charger flags say.
+    hw("charger none");
+    ASSERT_TRUE(dut_.waitBatteryRounds(kPastTurnOff));
+    EXPECT_EQ(dut_.logPos("AutoSleepCheck idle="), std::string::npos);
+}
+
+TEST_F(IdleTest, FullKeepsTheDeviceOnOnEachChargerAndTurnsOffWithoutOne) {
+    start("1");
+    hw("battery status 5");
+    // One charger at a time; each line swaps them at once, so the charging state never
+    // changes (a change would restart the idle count).
+    for (const char *swap : {"ac 1 usb 0", "wireless 1 ac 0", "usb 1 wireless 0"}) {
+        SCOPED_TRACE(swap);
+        hw(std::string("charger ") + swap);
+        ASSERT_TRUE(dut_.waitLog("SetSleepStatus end", 15000));
+        ASSERT_TRUE(dut_.waitBatteryRounds(kPastTurnOff)) << "powered off";
+    }
+    EXPECT_EQ(dut_.logPos("AutoSleepCheck idle="), std::string::npos);
+    // Full with no charger online is not charging: it turns off.
+    hw("charger none");
+    EXPECT_EQ(dut_.wait(15000), 100);
+    EXPECT_NE(dut_.logPos("AutoSleepCheck idle="), std::string::npos);
 }
 
 TEST_F(IdleTest, OsIdleOffNeverSleeps) {
     start("0");
-    ASSERT_TRUE(dut_.consoleOk("hw charger none"));
-    ASSERT_TRUE(dut_.consoleOk("hw battery status 3"));
-    EXPECT_EQ(dut_.wait(6000), -1);
+    hw("charger none");
+    hw("battery status 3");
+    ASSERT_TRUE(dut_.waitBatteryRounds(kPastTurnOff));
     EXPECT_EQ(dut_.logPos("SetSleepStatus"), std::string::npos);
     ASSERT_TRUE(dut_.consoleOk("key press 1"));
     EXPECT_TRUE(dut_.waitLog("cannot do idle,g_bOsIsCanIdle=0"));

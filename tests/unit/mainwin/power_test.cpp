@@ -103,6 +103,12 @@ class PowerTest : public ::testing::Test {
         fx.events.clear();
     }
     void TearDown() override { g_powerOps = mmi_power_default_ops(); }
+    // A fresh start whose first battery record is b (the idle count starts with it).
+    void restart(FTX_BATTERY_INFO b) {
+        mmi_power_reset();
+        batteryTemperatureobserver_cb(&b);
+        fx.events.clear();
+    }
     // One battery-service tick after secs seconds without input.
     void tick_after(long secs, FTX_BATTERY_INFO b = battery()) {
         fx.now += secs * 1000000LL;
@@ -178,6 +184,41 @@ TEST_F(PowerTest, TurnOffTimePowersOffUnlessCharging) {
     ASSERT_TRUE(has_event("power off"));
     std::vector<std::string> tail(fx.events.end() - 3, fx.events.end());
     EXPECT_EQ(tail, (std::vector<std::string>{"uninit", "vibrate 1000", "power off"}));
+}
+
+TEST_F(PowerTest, FullStaysOnWithAnyOneChargerOtherStatesTurnOff) {
+    g_autoSleepTime = 1000;
+    g_autoTurnOffTime = 100;
+    struct Charger {
+        const char *name;
+        unsigned char FTX_BATTERY_INFO::*online;
+    };
+    const Charger chargers[] = {{"ac", &FTX_BATTERY_INFO::chargerAcOnline},
+                                {"usb", &FTX_BATTERY_INFO::chargerUsbOnline},
+                                {"wireless", &FTX_BATTERY_INFO::chargerWirelessOnline}};
+    for (const Charger &c : chargers) {
+        SCOPED_TRACE(c.name);
+        FTX_BATTERY_INFO b = battery(300, FTX_BATTERY_STATUS_FULL);
+        b.*c.online = 1;
+        restart(b);
+        tick_after(100, b);
+        tick_after(100, b);  // the count started again at the first
+        EXPECT_FALSE(has_event("power off"));
+        // On the same charger only "charging" and "full" keep it on.
+        for (int status : {FTX_BATTERY_STATUS_UNKNOWN, FTX_BATTERY_STATUS_DISCHARGING,
+                           FTX_BATTERY_STATUS_NOT_CHARGING}) {
+            SCOPED_TRACE(status);
+            b.batteryStatus = status;
+            restart(b);
+            tick_after(100, b);
+            EXPECT_TRUE(has_event("power off"));
+        }
+    }
+    // Charging needs no charger flag at all.
+    FTX_BATTERY_INFO charging = battery(300, FTX_BATTERY_STATUS_CHARGING);
+    restart(charging);
+    tick_after(100, charging);
+    EXPECT_FALSE(has_event("power off"));
 }
 
 TEST_F(PowerTest, OsIdleOffNeverSleepsNorPowersOff) {
