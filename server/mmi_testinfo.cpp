@@ -55,15 +55,17 @@ void write_byte(int index, unsigned char value) {
 }
 
 // Compares the current byte of the working buffer with the library's; on a difference
-// writes it once more when a result was written. No second check.
+// writes it once more when a result was written. No second check. The caller is told
+// "done" either way, so a byte that did not land is an error in the log.
 void check_written(const unsigned char *work, bool writes) {
     unsigned char back[MMI_TESTINFO_FLAGS_SIZE];
     memset(back, 0, sizeof(back));
     read_area(back);
     int b = s_byteIndex;
     if (work[b] == back[b]) return;
-    MMI_LOGD(kTag, "%s::check testinfo indexbyte=%d,writeval=%d,readval=%d", kWriteName, b, work[b],
-             back[b]);
+    __android_log_print(ANDROID_LOG_ERROR, kTag,
+                        "%s::check testinfo indexbyte=%d,writeval=%d,readval=%d", kWriteName, b,
+                        work[b], back[b]);
     if (writes) write_byte(b, work[b]);
 }
 

@@ -12,6 +12,7 @@
 #include <mutex>
 #include <string>
 
+#include "root_check.h"
 #include "tp_os.h"
 
 namespace {
@@ -57,6 +58,7 @@ double read_time_scale() {
 extern "C" int tp_os_thread_init(int argc, char **argv) {
     (void)argc;
     (void)argv;
+    ftxhost::require_writable_root();
     // Semaphore 0 always exists: the main thread parks on it.
     tp_os_sema_create(0, 0);
     return 0;

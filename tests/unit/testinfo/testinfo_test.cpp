@@ -134,12 +134,26 @@ TEST_F(TestInfo, OtherResultsWriteNothing) {
 }
 
 TEST_F(TestInfo, ReadBackRetriesOnceAndGivesUp) {
+    {
+        LogCapture stored;
+        mmi_write_testinfo_single_byte(8, 1);
+        for (const std::string &l : stored.lines)
+            EXPECT_NE('E', l[0]) << "a stored result is no error: " << l;
+    }
+    memset(g_area, 0, sizeof(g_area));
+    g_writes.clear();
     g_storeWrites = false;  // the library drops every write
     LogCapture log;
     mmi_write_testinfo_single_byte(8, 1);
     // The write, its one retry; the second check compares byte 99 (untouched), no write.
     EXPECT_EQ((std::vector<int>{2, 2}), written_bytes());
-    EXPECT_TRUE(log.has("check testinfo indexbyte=2,writeval=64,readval=0"));
+    // The caller hears "done" either way: the lost result is an error in the log.
+    EXPECT_TRUE(
+        log.has("E CHECKTESTINFO: mmi_write_testinfo_single_byte::check testinfo "
+                "indexbyte=2,writeval=64,readval=0"));
+    EXPECT_EQ(1, write_cmd("9,2,write"));
+    EXPECT_EQ("0", read_item(9));
+    EXPECT_TRUE(log.has("indexbyte=2,writeval=32,readval=0"));
 
     g_writes.clear();
     mmi_write_testinfo_single_byte(280, 2);
