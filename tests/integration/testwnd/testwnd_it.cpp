@@ -7,7 +7,6 @@
 #include <chrono>
 #include <filesystem>
 #include <string>
-#include <thread>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -144,7 +143,6 @@ class Handset {
         std::string r = dut.console("key press " + std::to_string(code));
         EXPECT_NE(std::string::npos, r.find("OK")) << r;
     }
-    void idle() { dut.consoleOk("idle 3000"); }
 
     std::string activeCaption() {
         std::string w = dut.console("windows");
@@ -164,12 +162,12 @@ class Handset {
         ASSERT_TRUE(waitActive("Device Test"));
     }
     // Rows: 0 full run, 1 information, 2 pretest 1, 3 pretest 2, 4.. the enabled items.
+    // Keys go to the active window, so the list must be in front before they are sent.
     void chooseRow(int row) {
-        idle();
+        ASSERT_TRUE(waitActive("Device Test"));
         for (int i = 0; i < row; i++)
             key(108);
         key(28);
-        idle();
     }
     // Device-test list, then a row, until the window of that caption is in front.
     bool fromList(int row, const std::string &caption) {
@@ -187,24 +185,35 @@ class Handset {
                         std::to_string(value) + ",write");
         EXPECT_EQ(0, r.first);
     }
-    size_t count(const std::string &text) {
-        std::string log = dut.logcat();
-        size_t n = 0;
-        for (size_t p = log.find(text); p != std::string::npos; p = log.find(text, p + 1))
-            n++;
-        return n;
-    }
+    size_t count(const std::string &text) { return dut.logCount(text); }
     Png shot(const std::string &name) {
         std::string path = dut.root() + "/" + name;
         EXPECT_TRUE(dut.consoleOk("screenshot " + path));
         Png png;
         EXPECT_TRUE(png.load(path));
-        // FTX_DOCS_SHOTS collects the pictures for the documentation.
+        keepForDocs(name, name);
+        return png;
+    }
+    // Screenshots until what the test waits for is on the screen (painting, and what a
+    // library callback brings, happen after the action that caused them); the last one.
+    template <typename Pred>
+    Png shotWhen(const std::string &name, Pred shows, int timeoutMs = 10000) {
+        Png png;
+        bool seen = dut_wait_until(
+            [&] {
+                png = shot(name);
+                return shows(png);
+            },
+            timeoutMs);
+        EXPECT_TRUE(seen) << name << ": the screen never showed what was waited for";
+        return png;
+    }
+    // FTX_DOCS_SHOTS collects the pictures for the documentation.
+    void keepForDocs(const std::string &name, const std::string &as) {
         if (const char *dir = getenv("FTX_DOCS_SHOTS")) {
-            std::filesystem::copy_file(path, std::string(dir) + "/" + name,
+            std::filesystem::copy_file(dut.root() + "/" + name, std::string(dir) + "/" + as,
                                        std::filesystem::copy_options::overwrite_existing);
         }
-        return png;
     }
 
     DeviceUnderTest dut;
@@ -212,27 +221,77 @@ class Handset {
 
 const Item kVibrator = {"FTX_VIBRATOR", 1, 0, 1};
 
+// Milliseconds since midnight of the log line that holds text (logcat's "MM-DD
+// HH:MM:SS.mmm" prefix), or -1.
+long log_ms(const std::string &log, const std::string &text) {
+    size_t p = log.find(text);
+    if (p == std::string::npos) return -1;
+    size_t line = log.rfind('\n', p);
+    line = line == std::string::npos ? 0 : line + 1;
+    int mon, day, hh, mm, ss, ms;
+    if (sscanf(log.c_str() + line, "%d-%d %d:%d:%d.%d", &mon, &day, &hh, &mm, &ss, &ms) != 6)
+        return -1;
+    return ((hh * 60L + mm) * 60L + ss) * 1000L + ms;
+}
+
+bool pass_label(const Png &p) {
+    return p.count(0, 1185, 240, 1280, light) > 20;
+}
+bool fail_label(const Png &p) {
+    return p.count(480, 1185, 720, 1280, light) > 20;
+}
+
 TEST(TestWindow, PassLabelShowsOnlyAfterTheFoolProofDelay) {
-    Handset h({kVibrator}, 0.5);
+    using Clock = std::chrono::steady_clock;
+    const auto kDelay = std::chrono::milliseconds(3000);  // the vibrator's, at time scale 1
+    Handset h({kVibrator}, 1.0);
     ASSERT_TRUE(h.start());
-    ASSERT_TRUE(h.fromList(4, "Vibration Test"));
-    Png before = h.shot("vibrator_before_delay.png");
-    ASSERT_TRUE(h.dut.waitLog("WaitForFoolProof end"));
-    h.idle();
-    Png after = h.shot("vibrator_after_delay.png");
-    // Left slot of the soft-key bar: the pass label; right slot: the fail label.
-    EXPECT_EQ(0, before.count(0, 1185, 240, 1280, light));
-    EXPECT_GT(before.count(480, 1185, 720, 1280, light), 20);
-    EXPECT_GT(after.count(0, 1185, 240, 1280, light), 20);
-    EXPECT_GT(after.count(480, 1185, 720, 1280, light), 20);
-    // The note is drawn in the window and the vibrator runs while it is open.
-    EXPECT_GT(after.count(90, 100, 540, 180, light), 50);
+    h.openDeviceList();
+    for (int i = 0; i < 4; i++)
+        h.key(108);
+    const Clock::time_point opened = Clock::now();  // the delay cannot begin before this
+    h.key(28);
+    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    ASSERT_TRUE(h.dut.waitLog("WaitForFoolProof begin"));
+
+    // Screenshots one after the other until the pass label is there. A picture finished
+    // before opened + 3 s, or before the thread logged the end of its sleep, was taken
+    // inside the delay; those of its last second show what a 2 s delay would already
+    // have shown.
+    const char kSlept[] = "after sleep ,WaitForFoolProof";
+    int inDelay = 0;
+    Png last;
+    bool shown = dut_wait_until(
+        [&] {
+            last = h.shot("vibrator.png");
+            Clock::time_point done = Clock::now();
+            bool slept = h.dut.logPos(kSlept) != std::string::npos;
+            if (done < opened + kDelay || !slept) {
+                inDelay++;
+                EXPECT_FALSE(pass_label(last)) << "pass label inside the delay, shot " << inDelay;
+                h.keepForDocs("vibrator.png", "vibrator_before_delay.png");
+            }
+            return pass_label(last);
+        },
+        15000);
+    ASSERT_TRUE(shown) << "the pass label never came";
+    ASSERT_GT(inDelay, 0);
+    h.keepForDocs("vibrator.png", "vibrator_after_delay.png");
+    // The thread's own log: the sleep between its first two lines is the whole delay.
+    std::string log = h.dut.logcat();
+    long slept = log_ms(log, kSlept) - log_ms(log, "WaitForFoolProof begin");
+    if (slept < 0) slept += 24L * 3600 * 1000;  // midnight
+    EXPECT_GE(slept, 2950);
+    // Both labels now; the note is drawn in the window and the vibrator runs while it is open.
+    EXPECT_TRUE(fail_label(last));
+    EXPECT_GT(last.count(90, 100, 540, 180, light), 50);
     EXPECT_NE(std::string::npos,
               h.dut.console("hw status").find("ftx_api_Vibrator_Test_Start(ms=0) x1"));
 }
 
 TEST(TestWindow, KeysOutsideARunLeaveTheRecordAlone) {
-    Handset h({kVibrator}, 1.0);
+    // Scaled so the 3 s delay lasts 12 s: both keys come long before it ends.
+    Handset h({kVibrator}, 4.0);
     ASSERT_TRUE(h.start());
     ASSERT_TRUE(h.fromList(4, "Vibration Test"));
     // Pass works at once, long before the 3 s delay; the delay thread is ended with it.
@@ -245,7 +304,8 @@ TEST(TestWindow, KeysOutsideARunLeaveTheRecordAlone) {
     ASSERT_TRUE(h.waitActive("Device Test"));
     EXPECT_EQ(0, h.result(316));
     EXPECT_EQ(0, h.result(64));
-    std::this_thread::sleep_for(std::chrono::milliseconds(3500));
+    // Each key ended its window's delay thread before the delay was over.
+    ASSERT_TRUE(h.dut.waitLogCount("WaitForFoolProof stopped", 2));
     EXPECT_EQ(0u, h.count("after sleep ,WaitForFoolProof"));
     EXPECT_NE(std::string::npos,
               h.dut.console("hw status").find("ftx_api_Vibrator_Test_Stop() x2"));
@@ -372,6 +432,9 @@ TEST(Pc, VibratorIdentityBatteryAndDialog) {
     ASSERT_TRUE(dut_wait_until([&] { return h.activeCaption() != "Device Test"; }, 5000));
     EXPECT_EQ(0, h.dut.pc("CloseDialog testItem start").first);
     EXPECT_TRUE(h.waitActive("Device Test"));
+    // The dialog's answer is acted on by the GUI thread right after the dialog is gone.
+    ASSERT_TRUE(h.dut.waitLog("DestroyDialog end"));
+    ASSERT_TRUE(h.dut.consoleOk("idle 5000"));
     EXPECT_EQ(0u, h.count("mmi_AutoTestEntry begin."));
 }
 
@@ -403,27 +466,26 @@ TEST(DeviceList, ShowsEachItemInTheColourOfItsResultAfterARun) {
     ASSERT_TRUE(h.start());
     h.setResult(324, 2);
     h.setResult(360, 1);
+    // Rows are 96 high below the 3-pixel line: 0 full run, 4 SIM, 5 SD, 6 vibrator.
+    auto top = [](int r) { return 61 + 96 * r; };
+    auto reds = [&](const Png &p, int r) { return p.count(0, top(r), 720, top(r + 1), red); };
+    auto greens = [&](const Png &p, int r) { return p.count(0, top(r), 720, top(r + 1), green); };
     h.openDeviceList();
-    Png first = h.shot("device_test_list_before.png");
+    Png first = h.shotWhen("device_test_list_before.png",
+                           [&](const Png &p) { return reds(p, 4) > 50 && greens(p, 5) > 50; });
+    EXPECT_EQ(0, greens(first, 6));  // before the run the vibrator row was untested
+    EXPECT_EQ(0, greens(first, 0));
     h.chooseRow(0);
     ASSERT_TRUE(h.waitActive("Vibration Test"));
     h.key(60);
     // The end of the run refreshes the open list from the record.
     ASSERT_TRUE(h.dut.waitLog("mmi_DeviceTest_Refresh open=1"));
     ASSERT_TRUE(h.waitActive("Device Test"));
-    h.idle();
-    Png list = h.shot("device_test_list.png");
-    // Rows are 96 high below the 3-pixel line: 0 full run, 4 SIM, 5 SD, 6 vibrator.
-    auto top = [](int r) { return 61 + 96 * r; };
-    auto reds = [&](const Png &p, int r) { return p.count(0, top(r), 720, top(r + 1), red); };
-    auto greens = [&](const Png &p, int r) { return p.count(0, top(r), 720, top(r + 1), green); };
+    Png list = h.shotWhen("device_test_list.png",
+                          [&](const Png &p) { return greens(p, 6) > 50 && greens(p, 0) > 50; });
     EXPECT_GT(reds(list, 4), 50);
     EXPECT_EQ(0, greens(list, 4));
     EXPECT_GT(greens(list, 5), 50);
-    EXPECT_GT(greens(list, 6), 50);
-    EXPECT_GT(greens(list, 0), 50);
-    EXPECT_EQ(0, greens(first, 6));  // before the run the vibrator row was untested
-    EXPECT_EQ(0, greens(first, 0));
 }
 
 TEST(MonomerPreview, HardwareVersionShowsTheFirmwareAndHandsOverToTheNextItem) {
@@ -436,9 +498,9 @@ TEST(MonomerPreview, HardwareVersionShowsTheFirmwareAndHandsOverToTheNextItem) {
     h.key(108);
     h.key(28);
     ASSERT_TRUE(h.waitActive("Hardware Version"));
-    h.idle();
-    Png shot = h.shot("monomer_hardware_version.png");
-    EXPECT_GT(shot.count(90, 100, 630, 400, light), 100);  // the firmware text
+    // The firmware text.
+    h.shotWhen("monomer_hardware_version.png",
+               [](const Png &p) { return p.count(90, 100, 630, 400, light) > 100; });
     h.key(60);
     EXPECT_TRUE(h.dut.waitLog("mmi_Monomer_LCDColorTestEntry: test not available yet"));
     EXPECT_EQ(0, h.result(64));  // the preview records nothing
@@ -450,13 +512,14 @@ TEST(InfoScreen, ShowsTheIdentityAndThePassedAndFailedItems) {
     h.setResult(316, 1);
     h.setResult(280, 2);
     ASSERT_TRUE(h.fromList(1, "Product Information"));
-    // The IMEI arrives through the library's callback; the screen then rebuilds.
-    h.idle();
-    Png info = h.shot("product_information.png");
     // Lines 56 high from y 61: 5 the IMEI (value on the right), 7 item 64 failed by the
     // fail of 280, 8 item 280 (red), 9 item 316 (green), nothing after.
     auto top = [](int r) { return 61 + 56 * r; };
-    EXPECT_GT(info.count(400, top(5), 700, top(6), light), 50);
+    // The IMEI arrives through the library's callback, after the screen opened; the screen
+    // then rebuilds.
+    Png info = h.shotWhen("product_information.png", [&](const Png &p) {
+        return p.count(400, top(5), 700, top(6), light) > 50;
+    });
     EXPECT_GT(info.count(0, top(7), 720, top(8), red), 50);
     EXPECT_GT(info.count(0, top(8), 720, top(9), red), 50);
     EXPECT_GT(info.count(0, top(9), 720, top(10), green), 50);
