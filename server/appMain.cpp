@@ -12,6 +12,7 @@
 #include "AtThread.h"
 #include "ftx_lib_binding.h"
 #include "ftx_log.h"
+#include "mmi_autotest_config.h"
 #include "mmi_iconlet.h"
 #include "mmi_mainwnd.h"
 #include "mmi_settings.h"
@@ -32,6 +33,8 @@ int main(int argc, char **argv) {
     InitGUI(argc, (const char **)argv);
     LOGD("%s InitGUI end", "main");
     RegisterIconLetCtrl();
+    // Nothing rewrites the configuration yet: a temporary there was cut short by a kill.
+    mmi_config_clear_stale_temporary();
     mmi_initconfig();
     if (ftx_init_libdvk_ncoredevice_dll() != 0) {
         LOGE("FATAL ERROR:ftx_init_libdvk_ncoredevice_dll fail! %s", "main");

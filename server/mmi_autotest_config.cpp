@@ -4,6 +4,7 @@
 #include <string.h>
 #include <sys/mount.h>
 
+#include <mutex>
 #include <string>
 
 #include <android/log.h>
@@ -19,7 +20,14 @@
 
 namespace {
 
-const size_t kMaxConfigSize = 1 << 20;
+// The configuration is a few kilobytes; the limit only bounds the memory of a rewrite. A
+// larger file is refused whole rather than written back cut.
+const size_t kMaxConfigSize = 16u << 20;
+const char kTmpFile[] = FTX_MAIN_CONFIG_FILE ".tmp";
+
+// One rewrite at a time: the end of a run and the PC may both change a key, and each
+// rewrite reads what the last one wrote and goes through the same temporary.
+std::mutex s_writeLock;
 
 std::string trimmed(const std::string &s) {
     size_t b = s.find_first_not_of(" \t");
@@ -123,6 +131,7 @@ int mmi_AutoTest_Modify_ConfigFile(const char *parm) {
         return 0;
     }
     remount_system_partition();
+    std::lock_guard<std::mutex> lock(s_writeLock);
 
     FILE *fp = dev_fopen(FTX_MAIN_CONFIG_FILE, "rb");
     if (!fp) {
@@ -132,16 +141,22 @@ int mmi_AutoTest_Modify_ConfigFile(const char *parm) {
     std::string in;
     char buf[4096];
     size_t n;
-    while ((n = fread(buf, 1, sizeof(buf), fp)) > 0 && in.size() < kMaxConfigSize) {
+    while (in.size() <= kMaxConfigSize && (n = fread(buf, 1, sizeof(buf), fp)) > 0) {
         in.append(buf, n);
     }
+    bool readError = ferror(fp) != 0;
     fclose(fp);
+    if (readError || in.size() > kMaxConfigSize) {
+        CW_ERROR("%s %s %s: left unchanged", __func__, FTX_MAIN_CONFIG_FILE,
+                 readError ? "cannot be read" : "is over 16 MB");
+        return 0;
+    }
 
     std::string out;
     if (mmi_config_set_value(in, domain, key, value, &out) != 0) return 0;
 
     // Written beside and renamed over, so a power cut leaves the old or the new file.
-    const char *tmp = FTX_MAIN_CONFIG_FILE ".tmp";
+    const char *tmp = kTmpFile;
     fp = dev_fopen(tmp, "wb");
     if (!fp) {
         CW_ERROR("%s open %s fail.", __func__, tmp);
@@ -149,13 +164,21 @@ int mmi_AutoTest_Modify_ConfigFile(const char *parm) {
     }
     bool ok = fwrite(out.data(), 1, out.size(), fp) == out.size();
     ok = fflush(fp) == 0 && ok;
-    fsync(fileno(fp));
-    fclose(fp);
+    ok = fsync(fileno(fp)) == 0 && ok;
+    ok = fclose(fp) == 0 && ok;
     if (!ok || dev_rename(tmp, FTX_MAIN_CONFIG_FILE) != 0) {
         CW_ERROR("%s write %s fail.", __func__, FTX_MAIN_CONFIG_FILE);
         dev_unlink(tmp);
         return 0;
     }
     CW_DEBUG("%s %s,%s=%s", __func__, domain, key, value);
+    return 1;
+}
+
+int mmi_config_clear_stale_temporary(void) {
+    std::lock_guard<std::mutex> lock(s_writeLock);
+    if (dev_unlink(kTmpFile) != 0) return 0;
+    __android_log_print(ANDROID_LOG_WARN, "FTX_CONFIG", "%s removed %s left by a rewrite cut short",
+                        __func__, kTmpFile);
     return 1;
 }

@@ -13,3 +13,6 @@ int mmi_config_split_parm(const char *parm, char *domain, char *key, char *value
 // domain at the end of the file. 0, or -1 for unsafe names.
 int mmi_config_set_value(const std::string &in, const char *domain, const char *key,
                          const char *value, std::string *out);
+// Removes the temporary of a rewrite that a kill cut short (start-up, before any rewrite
+// runs). 1 when there was one, else 0.
+int mmi_config_clear_stale_temporary(void);

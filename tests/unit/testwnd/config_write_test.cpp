@@ -1,12 +1,16 @@
 // The configuration writer: what the reader sees after a rewrite, and what the PC cannot do.
 #include <string.h>
 
+#include <thread>
+#include <vector>
+
 #include <gtest/gtest.h>
 
 #include "ftx_config.h"
 #include "mmi_autotest.h"
 #include "mmi_autotest_config.h"
 #include "support/temp_root.h"
+#include "unit/config/log_capture.h"
 
 namespace {
 
@@ -86,6 +90,67 @@ TEST(ConfigWrite, ModifyFailsWithoutAFile) {
     TempRoot root;
     EXPECT_EQ(0, mmi_AutoTest_Modify_ConfigFile("MMI,mmi_flag,0"));
     EXPECT_FALSE(root.exists(FTX_MAIN_CONFIG_FILE));
+}
+
+TEST(ConfigWrite, LargeFilesAreRewrittenWholeOrRefusedUntouched) {
+    TempRoot root;
+    // Comment lines of 100 bytes around the domain, so a cut would fall inside a line.
+    std::string filler;
+    for (int i = 0; filler.size() < (3u << 19); i++)
+        filler += "# " + std::string(95, 'a' + i % 26) + "\r\n";
+    const std::string big = filler + kImage + filler + "[LAST]\r\nkey=end\r\n";
+    ASSERT_GT(big.size(), 2u << 20);
+    root.write(FTX_MAIN_CONFIG_FILE, big);
+    EXPECT_EQ(1, mmi_AutoTest_Modify_ConfigFile("MMI,mmi_flag,0"));
+    std::string want = big;
+    want.replace(want.find("mmi_flag=1"), 10, "mmi_flag=0");
+    EXPECT_TRUE(want == root.read(FTX_MAIN_CONFIG_FILE)) << "the rewrite changed more than a key";
+    EXPECT_EQ("end", read_back(root, "LAST", "key"));
+
+    // Over the 16 MB the writer holds in memory: refused, the file left as it was.
+    std::string huge = want;
+    while (huge.size() <= (16u << 20))
+        huge += filler;
+    root.write(FTX_MAIN_CONFIG_FILE, huge);
+    LogCapture log;
+    EXPECT_EQ(0, mmi_AutoTest_Modify_ConfigFile("MMI,mmi_flag,1"));
+    EXPECT_TRUE(
+        log.has("E FTX_CONFIG: mmi_AutoTest_Modify_ConfigFile /etc/ftx_config.ini is over"));
+    EXPECT_TRUE(huge == root.read(FTX_MAIN_CONFIG_FILE));
+    EXPECT_FALSE(root.exists(FTX_MAIN_CONFIG_FILE ".tmp"));
+}
+
+TEST(ConfigWrite, ConcurrentRewritesKeepEveryKey) {
+    TempRoot root;
+    root.write(FTX_MAIN_CONFIG_FILE, kImage);
+    // Two writers of different keys (the end of a run and the PC): each one's last value
+    // must be in the file.
+    std::vector<std::thread> writers;
+    for (const char *key : {"alpha", "beta"}) {
+        writers.emplace_back([key] {
+            for (int i = 0; i <= 30; i++) {
+                std::string parm = std::string("MMI,") + key + "," + std::to_string(i);
+                EXPECT_EQ(1, mmi_AutoTest_Modify_ConfigFile(parm.c_str()));
+            }
+        });
+    }
+    for (auto &t : writers)
+        t.join();
+    EXPECT_EQ("30", read_back(root, "MMI", "alpha"));
+    EXPECT_EQ("30", read_back(root, "MMI", "beta"));
+    EXPECT_EQ("1", read_back(root, "MMI", "mmi_flag"));
+}
+
+TEST(ConfigWrite, AStaleTemporaryIsClearedAtStart) {
+    TempRoot root;
+    root.write(FTX_MAIN_CONFIG_FILE, kImage);
+    EXPECT_EQ(0, mmi_config_clear_stale_temporary());
+    root.write(FTX_MAIN_CONFIG_FILE ".tmp", "[MMI]\r\nmmi_fl");  // a kill mid-write
+    LogCapture log;
+    EXPECT_EQ(1, mmi_config_clear_stale_temporary());
+    EXPECT_FALSE(root.exists(FTX_MAIN_CONFIG_FILE ".tmp"));
+    EXPECT_TRUE(log.has("W FTX_CONFIG: mmi_config_clear_stale_temporary removed"));
+    EXPECT_EQ(kImage, root.read(FTX_MAIN_CONFIG_FILE));
 }
 
 }  // namespace
