@@ -1,11 +1,14 @@
 // mmi_initconfig: the catalogue, the language texts and the process-wide settings.
 #include "mmi_settings.h"
 
+#include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
+#include <unistd.h>
 
 #include <android/log.h>
 
+#include "devfs.h"
 #include "ftx_config.h"
 #include "mmi_testitem.h"
 #include "tp_os.h"
@@ -141,6 +144,18 @@ bool read_log_path() {
     return true;
 }
 
+// A missing file leaves every setting at its built-in default, which looks like a working
+// handset: said at error level and on the console of whoever started the program.
+void report_if_missing(const char *devicePath) {
+    if (dev_access(devicePath, F_OK) == 0) return;
+    char host[512];
+    if (dev_path(devicePath, host, sizeof(host)) != 0) snprintf(host, sizeof(host), "?");
+    __android_log_print(ANDROID_LOG_ERROR, "FTX_CONFIG",
+                        "%s %s is missing (%s): built-in defaults apply", "mmi_initconfig",
+                        devicePath, host);
+    fprintf(stderr, "ftx-mmi: %s is missing (%s): built-in defaults apply\n", devicePath, host);
+}
+
 }  // namespace
 
 int mmi_initconfig(void) {
@@ -149,9 +164,13 @@ int mmi_initconfig(void) {
     Get_TestItem_Config(0);
 
     memset(g_chLanguageName, 0, sizeof(g_chLanguageName));
-    if (Read_MainCfgFile("MMI", "Language", g_chLanguageName, "Chinese") != 0) return -1;
+    if (Read_MainCfgFile("MMI", "Language", g_chLanguageName, "Chinese") != 0) {
+        report_if_missing(FTX_MAIN_CONFIG_FILE);
+        return -1;
+    }
     if (Get_CfgValueList(g_chLanguageName) != 0) {
         CFG_DEBUG("%s Get_CfgValueList fail.", __func__);
+        report_if_missing(FTX_LANGUAGE_FILE);
         return -1;
     }
 
