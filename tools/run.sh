@@ -4,6 +4,9 @@
 # Prepares the device root from sim/image when it is missing (--fresh makes it anew),
 # restarts the application when it asks for a reboot (exit status 101) and stops on a
 # power-off (100), on Ctrl-C or on any other end.
+# The log, ROOT/log/logcat.txt, keeps every priority: FTX_LOG_LEVEL=I (or W, E) raises the
+# floor, FTX_LOG_STDERR=1 echoes it here. It is a ring: past FTX_LOG_ROTATE_KB (4096) the
+# file becomes logcat.txt.1 and the oldest of FTX_LOG_ROTATE_COUNT (4) rotated files goes.
 set -uo pipefail
 
 TOP="${FTX_TOP:?run through ./ftx run}"
@@ -23,7 +26,7 @@ while [ $# -gt 0 ]; do
     --root=*) ROOT="${1#--root=}" ;;
     --screen) shift; SCREEN="${1:?--screen needs WxH}" ;;
     --screen=*) SCREEN="${1#--screen=}" ;;
-    -h|--help) sed -n '2,5p' "$0"; exit 0 ;;
+    -h|--help) sed -n '2,/^set /s/^# \{0,1\}//p' "$0"; exit 0 ;;
     *) say "unknown option: $1"; exit 2 ;;
   esac
   shift
@@ -71,7 +74,8 @@ trap stop INT TERM
 while :; do
   say "PC port: 127.0.0.1:$PORT   (./ftx pc COMMAND)"
   say "console: $ROOT/run/console.sock   (./ftx console -s $ROOT/run/console.sock LINE)"
-  say "log:     $ROOT/log/logcat.txt"
+  say "log:     $ROOT/log/logcat.txt   (floor ${FTX_LOG_LEVEL:-V}: FTX_LOG_LEVEL=W keeps warnings and errors only)"
+  say "         ring of ${FTX_LOG_ROTATE_KB:-4096} KB x (1 + ${FTX_LOG_ROTATE_COUNT:-4} rotated logcat.txt.N): FTX_LOG_ROTATE_KB, FTX_LOG_ROTATE_COUNT"
   "$BUILD/bin/ftx-mmi" &
   CHILD=$!
   wait "$CHILD"

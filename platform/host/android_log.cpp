@@ -1,7 +1,11 @@
-// The Android log on the host: logcat's threadtime lines in $FTX_ROOT/log/logcat.txt.
+// The Android log on the host: logcat's threadtime lines in $FTX_ROOT/log/logcat.txt, a
+// bounded ring like the handset's log buffer saved with logcat -r/-n: when the file would
+// pass FTX_LOG_ROTATE_KB (default 4096) it becomes logcat.txt.1, the older ones move up, and
+// logcat.txt.N (N = FTX_LOG_ROTATE_COUNT, default 4) is the oldest kept.
 #include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <sys/syscall.h>
 #include <sys/time.h>
@@ -20,8 +24,16 @@
 
 namespace {
 
+const long kDefaultRotateKb = 4096;
+const int kDefaultRotateCount = 4;
+const int kMaxRotateCount = 99;
+
 std::mutex g_logLock;
 FILE *g_logFile = nullptr;
+std::string g_logPath;  // of the open file
+long g_logSize = 0;     // of the open file, as of our last write
+long g_rotateBytes = -1;
+int g_rotateCount = -1;
 std::atomic<int> g_floor{-1};  // lowest priority kept; -1 until read from FTX_LOG_LEVEL
 int g_toStderr = -1;
 ftx_log_capture_fn g_capture = nullptr;
@@ -49,17 +61,82 @@ int log_floor() {
     return floor;
 }
 
-// Caller holds g_logLock.
+// A whole decimal number within [min, max] from the environment, else def.
+long env_number(const char *name, long def, long min, long max) {
+    const char *e = getenv(name);
+    if (e == nullptr || *e == '\0') return def;
+    char *end = nullptr;
+    long v = strtol(e, &end, 10);
+    return (*end == '\0' && v >= min && v <= max) ? v : def;
+}
+
+// Caller holds g_logLock for all of the helpers below.
+void read_ring_settings() {
+    if (g_rotateBytes >= 0) return;
+    g_rotateBytes = env_number("FTX_LOG_ROTATE_KB", kDefaultRotateKb, 1, 1L << 30) * 1024;
+    g_rotateCount = static_cast<int>(
+        env_number("FTX_LOG_ROTATE_COUNT", kDefaultRotateCount, 0, kMaxRotateCount));
+}
+
+void close_log() {
+    if (g_logFile != nullptr) fclose(g_logFile);
+    g_logFile = nullptr;
+}
+
 FILE *log_file() {
     if (g_logFile == nullptr) {
         char dir[4096];
         if (dev_path("/log", dir, sizeof(dir)) != 0) return nullptr;
         mkdir(dev_root(), 0755);
         mkdir(dir, 0755);
-        std::string file = std::string(dir) + "/logcat.txt";
-        g_logFile = fopen(file.c_str(), "a");
+        g_logPath = std::string(dir) + "/logcat.txt";
+        g_logFile = fopen(g_logPath.c_str(), "ae");  // not inherited by shell lines
+        struct stat st;
+        g_logSize = (g_logFile != nullptr && fstat(fileno(g_logFile), &st) == 0)
+                        ? static_cast<long>(st.st_size)
+                        : 0;
     }
     return g_logFile;
+}
+
+bool still_current(FILE *f) {
+    struct stat mine, named;
+    return fstat(fileno(f), &mine) == 0 && stat(g_logPath.c_str(), &named) == 0 &&
+           mine.st_ino == named.st_ino && mine.st_dev == named.st_dev;
+}
+
+// Moves logcat.txt to logcat.txt.1 (and each older file one up, the oldest dropped) and
+// starts an empty one. Another process writing the same log may have rotated already: the
+// file lock makes one of them do it, the other only reopens.
+void rotate() {
+    FILE *f = g_logFile;
+    flock(fileno(f), LOCK_EX);
+    if (still_current(f)) {
+        const std::string &base = g_logPath;
+        if (g_rotateCount == 0) {
+            unlink(base.c_str());
+        } else {
+            unlink((base + "." + std::to_string(g_rotateCount)).c_str());
+            for (int i = g_rotateCount - 1; i >= 1; i--) {
+                rename((base + "." + std::to_string(i)).c_str(),
+                       (base + "." + std::to_string(i + 1)).c_str());
+            }
+            rename(base.c_str(), (base + ".1").c_str());
+        }
+    }
+    flock(fileno(f), LOCK_UN);
+    close_log();
+}
+
+// The file to append n more bytes to, rotated first when they would pass the limit.
+FILE *log_file_for(size_t n) {
+    read_ring_settings();
+    FILE *f = log_file();
+    if (f != nullptr && g_logSize > 0 && g_logSize + static_cast<long>(n) > g_rotateBytes) {
+        rotate();
+        f = log_file();
+    }
+    return f;
 }
 
 }  // namespace
@@ -79,8 +156,9 @@ std::string timestamp() {
 
 void log_reset() {
     std::lock_guard<std::mutex> lock(g_logLock);
-    if (g_logFile != nullptr) fclose(g_logFile);
-    g_logFile = nullptr;
+    close_log();
+    g_rotateBytes = -1;
+    g_rotateCount = -1;
     g_floor = -1;
     g_toStderr = -1;
 }
@@ -131,10 +209,13 @@ extern "C" int __android_log_write(int prio, const char *tag, const char *text) 
         start = (nl == std::string::npos) ? msg.size() + 1 : nl + 1;
     } while (start <= msg.size());
 
-    FILE *f = log_file();
+    FILE *f = log_file_for(out.size());
     if (f != nullptr) {
         fwrite(out.data(), 1, out.size(), f);
         fflush(f);
+        // Appends land at the end whoever else writes the file, so the offset is its size.
+        long end = ftell(f);
+        g_logSize = end >= 0 ? end : g_logSize + static_cast<long>(out.size());
     }
     if (g_toStderr == 1) fwrite(out.data(), 1, out.size(), stderr);
     return static_cast<int>(out.size());

@@ -8,6 +8,7 @@
 #include <stdlib.h>
 #include <string.h>
 #include <sys/socket.h>
+#include <sys/stat.h>
 #include <sys/un.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -264,7 +265,26 @@ std::pair<int, std::string> DeviceUnderTest::pc(const std::string &line) const {
 }
 
 std::string DeviceUnderTest::logcat() const {
-    return read("/log/logcat.txt");
+    // The log is a ring: logcat.txt.N (oldest) ... logcat.txt.1, then logcat.txt. The newest
+    // is read first, so a rotation while reading repeats lines rather than losing them; a
+    // changed logcat.txt afterwards means one happened, and the whole is read again.
+    const std::string base = host("/log/logcat.txt");
+    auto inode = [&] {
+        struct stat st;
+        return stat(base.c_str(), &st) == 0 ? st.st_ino : 0;
+    };
+    std::string all;
+    for (int attempt = 0; attempt < 5; attempt++) {
+        ino_t before = inode();
+        all = slurp(base);
+        // Every number the ring allows: a rotation renames the older files one by one.
+        for (int i = 1; i <= 99; i++) {
+            std::string older = base + "." + std::to_string(i);
+            if (fs::exists(older)) all.insert(0, slurp(older));
+        }
+        if (inode() == before) break;
+    }
+    return all;
 }
 
 size_t DeviceUnderTest::logPos(const std::string &text) const {
