@@ -146,16 +146,16 @@ void common_start(const char *who) {
 void open_item(const testitem_node *item) {
     void *w = item->entry ? item->entry() : AUTOTEST_ENTRY_FAILED;
     if (w != AUTOTEST_ENTRY_FAILED) return;
-    AT_ERROR("%s %s could not be opened, run ended", __func__, item->config_domain);
-    g_bAutoTestRunning = 0;
-    g_autoTestMode = AUTOTEST_MODE_FULL;
+    AT_ERROR("%s %s could not be opened", __func__, item->config_domain);
+    mmi_autotest_end_run("an item could not be opened");
 }
 
 int start_first(int mode) {
     const testitem_node *first =
         mmi_autotest_first_item(g_pTestItemListHead, mode, g_mmiPreFlag.load());
     if (!first) {
-        AT_DEBUG("%s no item to run", __func__);
+        // Nothing takes part in this run: it is over before it began.
+        mmi_autotest_end_run("no item to run");
         return -1;
     }
     open_item(first);
@@ -280,7 +280,7 @@ int mmi_startNextItemTest(const char *domain) {
     if (g_bRestoreAutotest) {
         if (!file_exists(AUTOTEST_RESTORE_FLAG_FILE)) {
             AT_DEBUG("echo latest pass chdomain %s", domain);
-            write_text_file(AUTOTEST_LATEST_PASS_FILE, domain);
+            mmi_autotest_write_latest_pass(domain);
         } else {
             // First pass after a resume.
             remove_file(AUTOTEST_RESTORE_FLAG_FILE);
@@ -291,17 +291,51 @@ int mmi_startNextItemTest(const char *domain) {
     AT_DEBUG("%s chdomain=%s", __func__, domain);
     if (!g_pTestItemListHead) {
         AT_ERROR("%s error: pTestItemTmp is NULL", __func__);
+        mmi_autotest_end_run("empty item list");
         return -1;
     }
     const testitem_node *current = mmi_autotest_find_item(g_pTestItemListHead, domain);
-    // A domain that is not in the list ends the run as its last item would.
+    if (!current) {
+        // An empty or stale resume file, or an item no longer enabled: nothing says the run
+        // got to its end, so it stops here without the summary pass.
+        AT_ERROR("%s no item for chdomain=%s", __func__, domain);
+        mmi_autotest_end_run("current item not in the list");
+        return -1;
+    }
     const testitem_node *next =
-        current ? mmi_autotest_next_item(current, g_autoTestMode.load(), g_mmiPreFlag.load())
-                : nullptr;
+        mmi_autotest_next_item(current, g_autoTestMode.load(), g_mmiPreFlag.load());
     if (next) {
         open_item(next);
         return 0;
     }
     finish_run();
+    return 0;
+}
+
+void mmi_autotest_end_run(const char *why) {
+    AT_DEBUG("%s running=%d mode=%d: %s", __func__, g_bAutoTestRunning.load(),
+             g_autoTestMode.load(), why ? why : "");
+    g_bAutoTestRunning = 0;
+    g_autoTestMode = AUTOTEST_MODE_FULL;
+}
+
+int mmi_autotest_write_latest_pass(const char *text) {
+    // A power cut must leave the old content or the new one, never a truncated file:
+    // write a neighbour, flush it to the medium, then rename it over the old one.
+    char tmp[MMI_TEXT_SIZE];
+    snprintf(tmp, sizeof(tmp), "%s.tmp", AUTOTEST_LATEST_PASS_FILE);
+    FILE *fp = dev_fopen(tmp, "w");
+    if (!fp) {
+        AT_ERROR("open %s fail.", tmp);
+        return -1;
+    }
+    size_t len = strlen(text);
+    bool ok = fwrite(text, 1, len, fp) == len && fflush(fp) == 0 && fsync(fileno(fp)) == 0;
+    ok = fclose(fp) == 0 && ok;
+    if (!ok || dev_rename(tmp, AUTOTEST_LATEST_PASS_FILE) != 0) {
+        AT_ERROR("write %s fail.", AUTOTEST_LATEST_PASS_FILE);
+        dev_unlink(tmp);
+        return -1;
+    }
     return 0;
 }

@@ -52,6 +52,12 @@ const testitem_node *mmi_autotest_find_item(const testitem_node *head, const cha
 // The item after current that a run of `mode` opens next; null at the end of the list.
 const testitem_node *mmi_autotest_next_item(const testitem_node *current, int mode, int mmiPreFlag);
 
+// Ends the run where it is (an item that cannot open, a window closed from outside,
+// nothing to run or to resume): running cleared, mode back to the full run, no summary.
+void mmi_autotest_end_run(const char *why);
+// Writes the resume file atomically (a neighbour renamed over it). 0 on success.
+int mmi_autotest_write_latest_pass(const char *text);
+
 int mmi_AutoTestEntry(void);
 int mmi_AutoTestEntry_Ex(void);
 int mmi_AutoTestEntry_Ex2(void);

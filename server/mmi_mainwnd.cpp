@@ -522,7 +522,7 @@ void read_menu_config() {
 void restore_autotest() {
     if (!g_bRestoreAutotest) return;
     if (dev_access(AUTOTEST_LATEST_PASS_FILE, F_OK) != 0) {
-        dev_system("echo -n FIRST > /data/pv_autotest_latest_pass");
+        mmi_autotest_write_latest_pass("FIRST");
         return;
     }
     Get_TestItem_Config(1);

@@ -160,6 +160,8 @@ int Check_AllTestWnd_Closed(void) {
         if (w.stop) w.stop();
         closed++;
     }
+    // A run waits for a key in its window; with the window gone no pass or fail can come.
+    if (closed > 0 && g_bAutoTestRunning == 1) mmi_autotest_end_run("test window closed");
     return closed;
 }
 
@@ -294,7 +296,7 @@ void mmi_testwnd_record_pass(int resultIndex, const char *domain) {
 
 void mmi_testwnd_record_fail(int resultIndex) {
     if (g_bAutoTestRunning == 1) mmi_write_testinfo_single_byte(resultIndex, 2);
-    g_bAutoTestRunning = 0;
+    mmi_autotest_end_run("fail");
 }
 
 void mmi_testwnd_pass(const mmi_testwnd_desc *d) {

@@ -11,6 +11,7 @@
 #include "mmi_autotest.h"
 #include "mmi_runstate.h"
 #include "mmi_settings.h"
+#include "mmi_testwnd.h"
 #include "support/temp_root.h"
 
 namespace {
@@ -123,6 +124,54 @@ TEST(AutotestRule, NextItemByModeAndPreFlag) {
     ItemList m({{"A", 1, 0, 1}, {"B", 1, 1, 1}, {"C", 1, 0, 0}});
     EXPECT_EQ("C",
               std::string(domain_of(mmi_autotest_next_item(m.at(0), AUTOTEST_MODE_PRETEST1, 1))));
+}
+
+// Every value a configuration row can give `auto`, `mmi` and `pre` (0, 1 and anything
+// else), one candidate at a time: whether each run takes it as its first item and as the
+// item after another.
+TEST(AutotestRule, EachFlagValueInEveryRun) {
+    struct Case {
+        int autoF, mmi, pre;
+        // next item: full run, full run with mmi_flag, pretest 1, pretest 2, pretest 2
+        // with mmi_flag
+        bool full, fullMmi, pre1, pre2, pre2Mmi;
+        // first item: full run with mmi_flag, pretest 1, pretest 2
+        bool firstFullMmi, firstPre1, firstPre2;
+    };
+    const Case kCases[] = {
+        {1, 0, 0, true, true, false, true, true, true, false, true},
+        {1, 0, 1, true, true, true, false, false, true, true, false},
+        {1, 0, 2, true, true, true, true, true, true, true, true},
+        {0, 0, 2, false, false, false, false, false, false, true, true},
+        {0, 0, 0, false, false, false, false, false, false, false, true},
+        {1, 1, 0, true, false, false, true, false, false, false, true},
+        {1, 2, 0, true, true, false, true, true, false, false, true},
+        {2, 0, 2, true, true, true, true, true, true, true, true},
+        {1, 2, 2, true, true, true, true, true, false, true, true},
+    };
+    for (const Case &c : kCases) {
+        SCOPED_TRACE(testing::Message()
+                     << "auto " << c.autoF << " mmi " << c.mmi << " pre " << c.pre);
+        // The current item's own flags play no part in the next pick.
+        ItemList l({{"A", 0, 1, 1}, {"B", c.autoF, c.mmi, c.pre}});
+        auto takesNext = [&](int mode, int mmiFlag) {
+            return mmi_autotest_next_item(l.at(0), mode, mmiFlag) == l.at(1);
+        };
+        EXPECT_EQ(c.full, takesNext(AUTOTEST_MODE_FULL, 0));
+        EXPECT_EQ(c.fullMmi, takesNext(AUTOTEST_MODE_FULL, 1));
+        EXPECT_EQ(c.pre1, takesNext(AUTOTEST_MODE_PRETEST1, 0));
+        EXPECT_EQ(c.pre2, takesNext(AUTOTEST_MODE_PRETEST2, 0));
+        EXPECT_EQ(c.pre2Mmi, takesNext(AUTOTEST_MODE_PRETEST2, 1));
+
+        ItemList one({{"B", c.autoF, c.mmi, c.pre}});
+        auto takesFirst = [&](int mode, int mmiFlag) {
+            return mmi_autotest_first_item(one.head(), mode, mmiFlag) == one.at(0);
+        };
+        EXPECT_EQ(c.full, takesFirst(AUTOTEST_MODE_FULL, 0));
+        EXPECT_EQ(c.firstFullMmi, takesFirst(AUTOTEST_MODE_FULL, 1));
+        EXPECT_EQ(c.firstPre1, takesFirst(AUTOTEST_MODE_PRETEST1, 0));
+        EXPECT_EQ(c.firstPre2, takesFirst(AUTOTEST_MODE_PRETEST2, 0));
+    }
 }
 
 TEST(AutotestRule, CurrentItemIsFoundByItsDomainPrefix) {
@@ -294,13 +343,128 @@ TEST_F(Sequence, EndWithRestoreRemovesTheFilesAndOpensTheList) {
     EXPECT_EQ(0, g_bAutoTestRunning.load());
 }
 
-TEST_F(Sequence, UnknownDomainEndsTheRun) {
+TEST_F(Sequence, FullRunEndRecordsSixtySixTooWhenThePretestMenuIsOn) {
+    rec.pretestMenu = "1";
+    mmi_AutoTestEntry();
+    EXPECT_EQ(1, g_pretestMenuEnabled.load());
+    mmi_startNextItemTest("F");
+    EXPECT_EQ((std::vector<std::pair<int, int>>{{66, 1}, {64, 1}}), rec.results);
+
+    // Pretest 1 records its own 66 once, pretest 2 both.
+    rec.results.clear();
+    mmi_AutoTestEntry_Ex();
+    mmi_startNextItemTest("F");
+    EXPECT_EQ((std::vector<std::pair<int, int>>{{66, 2}, {66, 1}}), rec.results);
+    rec.results.clear();
+    rec.flags[16] = 0x04;
+    mmi_AutoTestEntry_Ex2();
+    mmi_startNextItemTest("D");
+    EXPECT_EQ((std::vector<std::pair<int, int>>{{66, 1}, {64, 1}}), rec.results);
+}
+
+// A domain that is in no node (nothing here is a prefix of these) ends the run where it
+// is: nothing says the run got to its end, so no summary is recorded.
+TEST_F(Sequence, DomainNotInTheListEndsTheRunWithoutASummary) {
+    for (const char *domain : {"", "ZZ_GONE", "G"}) {
+        SCOPED_TRACE(domain);
+        rec.results.clear();
+        g_bAutoTestRunning = 1;
+        g_autoTestMode = AUTOTEST_MODE_PRETEST1;
+        EXPECT_EQ(-1, mmi_startNextItemTest(domain));
+        EXPECT_TRUE(g_opened.empty());
+        EXPECT_TRUE(rec.results.empty());
+        EXPECT_EQ(0, g_bAutoTestRunning.load());
+        EXPECT_EQ(AUTOTEST_MODE_FULL, g_autoTestMode.load());
+    }
     g_bAutoTestRunning = 1;
-    mmi_startNextItemTest("FTX_NOWHERE");
-    EXPECT_TRUE(g_opened.empty());
-    EXPECT_EQ((std::vector<std::pair<int, int>>{{64, 1}}), rec.results);
     g_pTestItemListHead = nullptr;
     EXPECT_EQ(-1, mmi_startNextItemTest("A"));
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+}
+
+// What start-up leaves when it resumes: the restore flag, and the domain read from the
+// latest-pass file, which a power cut or a changed configuration may have left empty or
+// stale.
+TEST_F(Sequence, ResumeOfAnEmptyOrStaleDomainRecordsNothing) {
+    g_bRestoreAutotest = 1;
+    for (const char *domain : {"", "ZZ_NO_LONGER_ENABLED"}) {
+        SCOPED_TRACE(domain);
+        rec = Recorder();
+        root.write(AUTOTEST_RESTORE_FLAG_FILE, "");
+        mmi_startNextItemTest(domain);
+        EXPECT_TRUE(rec.results.empty());
+        EXPECT_TRUE(g_opened.empty());
+        EXPECT_EQ(0, g_bAutoTestRunning.load());
+        EXPECT_FALSE(root.exists(AUTOTEST_RESTORE_FLAG_FILE));
+        EXPECT_EQ(0, rec.listOpened);
+    }
+}
+
+TEST_F(Sequence, LatestPassIsReplacedWholeOrNotAtAll) {
+    g_bRestoreAutotest = 1;
+    g_bAutoTestRunning = 1;
+    root.write(AUTOTEST_LATEST_PASS_FILE, "FIRST");
+    mmi_startNextItemTest("C");
+    EXPECT_EQ("C", root.read(AUTOTEST_LATEST_PASS_FILE));
+    EXPECT_EQ(0, mmi_autotest_write_latest_pass("FIRST"));
+    EXPECT_EQ("FIRST", root.read(AUTOTEST_LATEST_PASS_FILE));
+    // Nothing but the file itself is left in /data.
+    EXPECT_FALSE(root.exists(std::string(AUTOTEST_LATEST_PASS_FILE) + ".tmp"));
+    // A write that cannot be completed leaves the previous content as it was (here the
+    // new text has nowhere to go: its neighbour's name is taken by a folder).
+    root.write(std::string(AUTOTEST_LATEST_PASS_FILE) + ".tmp/x", "");
+    EXPECT_EQ(-1, mmi_autotest_write_latest_pass("D"));
+    EXPECT_EQ("FIRST", root.read(AUTOTEST_LATEST_PASS_FILE));
+}
+
+// Every way a run ends leaves the device-test list usable: running cleared.
+TEST_F(Sequence, ARunWithNothingToOpenIsOverAtOnce) {
+    ItemList none({{"A", 0, 0, 0}, {"B", 0, 1, 0}});
+    g_list = &none;
+    mmi_AutoTestEntry();
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+    mmi_AutoTestEntry_Ex();
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+    EXPECT_EQ(AUTOTEST_MODE_FULL, g_autoTestMode.load());
+    ItemList allPre1({{"A", 1, 0, 1}});
+    g_list = &allPre1;
+    rec.flags[16] = 0x04;
+    mmi_AutoTestEntry_Ex2();
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+    EXPECT_TRUE(g_opened.empty());
+    rec.mmiFlag = "1";
+    ItemList onlyMmi({{"A", 1, 1, 1}});
+    g_list = &onlyMmi;
+    mmi_AutoTestEntry();
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+    EXPECT_TRUE(g_opened.empty());
+    g_list = &list;
+}
+
+int s_stops = 0;
+int fake_stop() {
+    s_stops++;
+    return 1;
+}
+
+TEST_F(Sequence, ClosingTheRunsWindowFromOutsideEndsTheRun) {
+    Check_AllTestWnd_Closed();  // whatever an earlier test left registered
+    mmi_AutoTestEntry();
+    ASSERT_EQ(1, g_bAutoTestRunning.load());
+    // Nothing open: a PC start closes nothing and the run goes on.
+    EXPECT_EQ(0, Check_AllTestWnd_Closed());
+    EXPECT_EQ(1, g_bAutoTestRunning.load());
+    HWND fake = (HWND)0x5150;
+    mmi_testwnd_register_open(fake, fake_stop);
+    EXPECT_EQ(1, Check_AllTestWnd_Closed());
+    EXPECT_EQ(1, s_stops);
+    EXPECT_EQ(0, g_bAutoTestRunning.load());
+    // A window closed outside a run changes nothing.
+    g_autoTestMode = AUTOTEST_MODE_PRETEST1;
+    mmi_testwnd_register_open(fake, fake_stop);
+    EXPECT_EQ(1, Check_AllTestWnd_Closed());
+    EXPECT_EQ(AUTOTEST_MODE_PRETEST1, g_autoTestMode.load());
+    EXPECT_TRUE(rec.results.empty());
 }
 
 TEST_F(Sequence, ItemThatCannotOpenEndsTheRunWithoutARecord) {
