@@ -26,11 +26,13 @@ const int kColourText = 19;
 const int kColourPass = 10;
 const int kColourFail = 12;
 
-// GUI thread only, apart from the handle.
+// GUI thread only, apart from the handle and the pending flag.
 std::atomic<HWND> s_window{HWND_INVALID};
 mmi_devicetest_row s_rows[MMI_DEVICETEST_MAX_ROWS];
 int s_rowCount;
 int s_results[MMI_DEVICETEST_MAX_ROWS];
+// A refresh is queued and has not reread the record yet: a burst of writes queues one.
+std::atomic<bool> s_refreshPending{false};
 
 int result_of(const unsigned char *flags, int item) {
     if (item < 0 || item >= MMI_TESTINFO_ITEMS) return 0;
@@ -39,6 +41,7 @@ int result_of(const unsigned char *flags, int item) {
 
 // A run rebuilds the item list; the rows follow it and reread the record.
 int fill_rows(void) {
+    s_refreshPending = false;  // a write from here on queues another refresh
     s_rowCount = mmi_devicetest_build_rows(g_pTestItemListHead, s_rows, MMI_DEVICETEST_MAX_ROWS);
     unsigned char flags[MMI_TESTINFO_FLAGS_SIZE] = {0};
     if (hw::ftx_api_GetTestInfoFlag) hw::ftx_api_GetTestInfoFlag(flags);
@@ -147,6 +150,7 @@ int mmi_DeviceTestEntry(void) {
     // Rows as high as the main menu's.
     static mmi_listscreen_desc list = kList;
     list.itemHeight = (g_ptScreenInfo.width / 15) * 2;
+    g_testinfoChanged = mmi_DeviceTest_RecordChanged;
     return mmi_listscreen_open(&list);
 }
 
@@ -162,4 +166,12 @@ void mmi_DeviceTest_Refresh(void) {
     HWND open = s_window.load();
     DT_DEBUG("%s open=%d", __func__, open != HWND_INVALID);
     if (open != HWND_INVALID) SendMessage(open, MSG_TIMER, MMI_DEVICETEST_TIMER_REFRESH, 0);
+}
+
+void mmi_DeviceTest_RecordChanged(void) {
+    // Any thread, with no lock of the record held: queue the refresh, never wait for it.
+    HWND open = s_window.load();
+    if (open == HWND_INVALID || s_refreshPending.exchange(true)) return;
+    if (PostMessage(open, MSG_TIMER, MMI_DEVICETEST_TIMER_REFRESH, 0) != ERR_OK)
+        s_refreshPending = false;
 }

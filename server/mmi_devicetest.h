@@ -40,3 +40,5 @@ int mmi_DeviceTest_IsOpen(void);
 HWND mmi_DeviceTest_Window(void);
 // Asks the open list to reread the record and redraw (MSG_TIMER, wParam 1).
 void mmi_DeviceTest_Refresh(void);
+// The record changed (any thread): queues one such refresh of the open list.
+void mmi_DeviceTest_RecordChanged(void);

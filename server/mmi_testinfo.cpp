@@ -98,7 +98,15 @@ void mmi_testinfo_current(int *byteIndex, int *slot) {
     if (slot != nullptr) *slot = s_slot;
 }
 
+std::atomic<void (*)(void)> g_testinfoChanged{nullptr};
+
 int mmi_write_testinfo_single_byte(int item, int result) {
+    // Declared before the lock, so it runs after the lock is released.
+    struct Notify {
+        ~Notify() {
+            if (void (*changed)(void) = g_testinfoChanged.load()) changed();
+        }
+    } notify;
     std::lock_guard<std::mutex> lock(s_writeLock);
     MMI_LOGD(kTag, "%s,itemindex=%d,testresult=%d", kWriteName, item, result);
     if (item < 0 || item >= MMI_TESTINFO_ITEMS) {

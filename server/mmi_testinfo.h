@@ -40,6 +40,9 @@ void mmi_testinfo_current(int *byteIndex, int *slot);
 // Records result (1 pass, 2 fail) for item through the factory library and checks it by
 // reading back; a fail of a station item also fails the CAC preview. Always 0.
 int mmi_write_testinfo_single_byte(int item, int result);
+// Called on the writer's thread after every write above, outside its lock, so that a
+// screen showing the record can redraw; null for none.
+extern std::atomic<void (*)(void)> g_testinfoChanged;
 
 // PC back ends of "testinfoMoudle testItem": "<item>,read" answers the item's value in
 // reply; "<item>,<result>,write" records it. 1 on success, 0 on a malformed command.
