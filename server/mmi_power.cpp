@@ -31,15 +31,24 @@ __attribute__((weak)) int TitleInfoShow(const char *, int, int) {
 
 namespace {
 
-// Lock order: battery mutex first, then the sleep mutex.
+// Lock order: battery mutex first, then the sleep mutex. The warning mutex is never held
+// with the battery mutex; it is held while the title strip is set.
 std::mutex s_sleepMutex;
 std::mutex s_batteryMutex;
 FTX_BATTERY_INFO s_battery;  // under s_batteryMutex
 bool s_batteryKnown = false;
 std::atomic<int> s_batteryPresent{0};  // read by the sleep path under the battery mutex
 int s_lastCharging = -1;               // battery thread only
-bool s_tempWarningShown = false;       // battery thread only
 
+// Battery warnings of the title strip, most urgent first. Each holds while its condition
+// does; the strip shows the most urgent one and gets its title back when none is left.
+enum Warning { WARN_TEMPERATURE, WARN_HEALTH, WARN_LOW_BATTERY, WARN_COUNT, WARN_NONE = -1 };
+const char *const kWarningKeys[WARN_COUNT] = {"batteryTemperatureWarning", "batteryHealthWarning",
+                                              "batteryLevelWaring"};
+std::mutex s_warnMutex;
+bool s_warning[WARN_COUNT];      // under s_warnMutex
+int s_warnedLevel = 0;           // level the low-battery warning came at (under s_warnMutex)
+int s_shownWarning = WARN_NONE;  // under s_warnMutex
 
 int shell_run(const char *cmd) {
     return dev_system(cmd);
@@ -102,6 +111,35 @@ int set_wakeup_status() {
     return ret;
 }
 
+bool health_is_bad(int health) {
+    return health == FTX_BATTERY_HEALTH_OVERHEAT || health == FTX_BATTERY_HEALTH_OVER_VOLTAGE ||
+           health == FTX_BATTERY_HEALTH_DEAD;
+}
+
+// The battery service warns of a low level while no charger is online; the warning is over
+// once one is, or once the level has climbed above both that level and the configured
+// low threshold.
+bool battery_low_over(const FTX_BATTERY_INFO *info, int warnedLevel) {
+    if (info->chargerAcOnline || info->chargerUsbOnline || info->chargerWirelessOnline) return true;
+    return info->batteryLevel > warnedLevel && info->batteryLevel > g_batteryWarningVolt;
+}
+
+// Caller holds s_warnMutex. The most urgent warning goes on the title strip; when the last
+// one left, the strip's own title comes back.
+void show_warnings() {
+    int top = WARN_NONE;
+    for (int i = WARN_COUNT - 1; i >= 0; i--)
+        if (s_warning[i]) top = i;
+    if (top != WARN_NONE) {
+        char text[FTX_CFG_TEXT_SIZE];
+        translate(kWarningKeys[top], text, sizeof text);
+        g_powerOps.title_show(text, 1, 1);
+    } else if (s_shownWarning != WARN_NONE) {
+        g_powerOps.title_show(nullptr, 1, 0);
+    }
+    s_shownWarning = top;
+}
+
 void power_off_idle() {
     if (g_powerOps.mode_uninit) g_powerOps.mode_uninit();
     if (g_powerOps.vibrator_start) {
@@ -126,13 +164,19 @@ mmi_power_ops mmi_power_default_ops(void) {
 mmi_power_ops g_powerOps = mmi_power_default_ops();
 
 void mmi_power_reset(void) {
+    {
+        std::lock_guard<std::mutex> warn(s_warnMutex);
+        for (bool &w : s_warning)
+            w = false;
+        s_warnedLevel = 0;
+        s_shownWarning = WARN_NONE;
+    }
     std::lock_guard<std::mutex> lk(s_batteryMutex);
     memset(&s_battery, 0, sizeof s_battery);
     s_battery.batteryLevel = -1;
     s_batteryKnown = false;
     s_batteryPresent = 0;
     s_lastCharging = -1;
-    s_tempWarningShown = false;
     g_bCurrentSleepStatus = 0;
     GetLastInputTime();
 }
@@ -290,21 +334,15 @@ void batteryTemperatureobserver_cb(const FTX_BATTERY_INFO *info) {
         g_powerOps.power_off();
         return;
     }
-    if (temp >= MMI_BATTERY_TEMP_WARNING) {
-        translate("batteryTemperatureWarning", text, sizeof text);
+    if (temp >= MMI_BATTERY_TEMP_WARNING)
         LOGD("battery Temperature Warning,current Temperature=%d", temp);
-        g_powerOps.title_show(text, 1, 1);
-        s_tempWarningShown = true;
-    } else if (s_tempWarningShown) {
-        // Cooled down: the title strip goes back to its normal text.
-        s_tempWarningShown = false;
-        g_powerOps.title_show(nullptr, 1, 0);
-    }
-    if (info->batteryHealth == FTX_BATTERY_HEALTH_OVERHEAT ||
-        info->batteryHealth == FTX_BATTERY_HEALTH_OVER_VOLTAGE ||
-        info->batteryHealth == FTX_BATTERY_HEALTH_DEAD) {
-        translate("batteryHealthWarning", text, sizeof text);
-        g_powerOps.title_show(text, 1, 1);
+    {
+        std::lock_guard<std::mutex> warn(s_warnMutex);
+        s_warning[WARN_TEMPERATURE] = temp >= MMI_BATTERY_TEMP_WARNING;
+        s_warning[WARN_HEALTH] = health_is_bad(info->batteryHealth);
+        if (s_warning[WARN_LOW_BATTERY] && battery_low_over(info, s_warnedLevel))
+            s_warning[WARN_LOW_BATTERY] = false;
+        show_warnings();
     }
     int charging = mmi_battery_is_charging(info);
     if (charging != s_lastCharging) {
@@ -319,11 +357,21 @@ void batteryTemperatureobserver_cb(const FTX_BATTERY_INFO *info) {
 }
 
 void batteryVoltobserver_cb(const FTX_BATTERY_INFO *info) {
-    (void)info;
     char text[FTX_CFG_TEXT_SIZE];
     translate("batteryLevelWaring", text, sizeof text);
     LOGD("SendMessage MSG_CREATEDIALG BATTERYMSG:%s", text);
-    g_powerOps.title_show(text, 1, 1);
+    FTX_BATTERY_INFO last;
+    if (info) {
+        last = *info;
+    } else {
+        mmi_battery_snapshot(&last);
+    }
+    {
+        std::lock_guard<std::mutex> warn(s_warnMutex);
+        s_warning[WARN_LOW_BATTERY] = true;
+        s_warnedLevel = last.batteryLevel;
+        show_warnings();
+    }
     if (g_powerOps.unregister_observer) {
         LOGD("FTX_API_BatteryService_unregister_Observer batteryVoltobserver_cb start");
         g_powerOps.unregister_observer(FTX_BATTERY_OBSERVER_VOLTAGE, batteryVoltobserver_cb);
