@@ -38,7 +38,8 @@ const Tool kTools[] = {
     {"sleep", Kind::FileApplet},        {"sync", Kind::FileApplet},
     {"tail", Kind::FileApplet},         {"touch", Kind::FileApplet},
     {"true", Kind::FileApplet},         {"wc", Kind::FileApplet},
-    {"dhcpcd", Kind::Recorder},         {"insmod", Kind::Recorder},
+    {"dhcpcd", Kind::Recorder},
+    {"dhcptool", Kind::Recorder},         {"insmod", Kind::Recorder},
     {"iwpriv", Kind::Recorder},         {"mmi_open_fb1", Kind::Recorder},
     {"ptt_socket_app", Kind::Recorder}, {"rmmod", Kind::Recorder},
 };
