@@ -27,36 +27,74 @@ void repaint(HWND h, IconLet *d) {
     if (!d->locked) InvalidateRect(h, nullptr, TRUE);
 }
 
-// Where each item's text goes. A centred text wider than its slot (a long title) spreads
-// into the room its neighbours' texts leave free instead of being cut at the slot's edges.
-std::vector<RECT> text_boxes(HDC hdc, const IconLet *d, int width, int height) {
-    size_t n = d->items.size();
-    std::vector<RECT> boxes(n);
-    std::vector<int> inkLeft(n), inkRight(n);
+// Where an item's text is drawn: the box it is clipped to and where it starts.
+struct TextPlace {
+    RECT box;
+    UINT fmt;
+};
+
+// Where each item's text goes. A text that fits its slot sits in it as aligned. A centred
+// text wider than its slot (a long title) may spread into the room its neighbours leave
+// free: a slot without text, or the part of a neighbour's slot beyond that neighbour's
+// text; two wide texts share the free room between them. It stays centred where that room
+// allows, keeps a gap to every other text, and what still does not fit is cut at the end of
+// its room, its start readable. No text is drawn over, or run into, another.
+std::vector<TextPlace> place_texts(HDC hdc, const IconLet *d, UINT fmt, int width, int height) {
+    const size_t n = d->items.size();
+    std::vector<TextPlace> places(n);
+    std::vector<int> inkW(n, 0);
+    int textH = 0;
     for (size_t i = 0; i < n; i++) {
         const ICONLET_ITEM &it = d->items[i];
-        boxes[i] = {it.x, 0, it.x + it.width, height};
+        places[i] = {{it.x, 0, it.x + it.width, height}, fmt};
         SIZE size = {0, 0};
         if (it.text[0] != '\0') GetTextExtent(hdc, it.text, -1, &size);
-        int centre = it.x + it.width / 2;
-        inkLeft[i] = size.cx > 0 ? centre - size.cx / 2 : centre;
-        inkRight[i] = size.cx > 0 ? centre + (size.cx + 1) / 2 : centre;
+        inkW[i] = size.cx;
+        textH = std::max(textH, (int)size.cy);
     }
-    if (d->align != ICONLET_ALIGN_CENTER) return boxes;
+    if (d->align != ICONLET_ALIGN_CENTER) return places;
+    const int gap = std::max(4, textH / 2);
+
+    // What each text holds: its ink when it fits its slot, the whole slot when it does not.
+    struct Claim {
+        int left, right;
+        bool wide;
+    };
+    std::vector<Claim> claims(n);
     for (size_t i = 0; i < n; i++) {
         const ICONLET_ITEM &it = d->items[i];
-        if (inkRight[i] - inkLeft[i] <= it.width) continue;
-        int left = 0, right = width;
-        for (size_t j = 0; j < n; j++) {
-            if (j == i || inkRight[j] == inkLeft[j]) continue;  // an empty neighbour
-            if (d->items[j].x < it.x) left = std::max(left, std::min(inkRight[j], it.x));
-            if (d->items[j].x > it.x)
-                right = std::min(right, std::max(inkLeft[j], it.x + it.width));
-        }
-        boxes[i].left = std::max(left, inkLeft[i]);
-        boxes[i].right = std::min(right, inkRight[i]);
+        bool wide = inkW[i] > it.width;
+        int centre = it.x + it.width / 2;
+        claims[i] = wide ? Claim{it.x, it.x + it.width, true}
+                         : Claim{centre - inkW[i] / 2, centre - inkW[i] / 2 + inkW[i], false};
     }
-    return boxes;
+    for (size_t i = 0; i < n; i++) {
+        const ICONLET_ITEM &it = d->items[i];
+        if (!claims[i].wide) continue;
+        // The nearest texts on either side.
+        int prev = -1, next = -1;
+        for (size_t j = 0; j < n; j++) {
+            if (j == i || inkW[j] == 0) continue;
+            const ICONLET_ITEM &o = d->items[j];
+            if (o.x < it.x && (prev < 0 || o.x > d->items[prev].x)) prev = (int)j;
+            if (o.x > it.x && (next < 0 || o.x < d->items[next].x)) next = (int)j;
+        }
+        int left = 0, right = width;
+        if (prev >= 0) {
+            const Claim &p = claims[prev];
+            left = p.wide ? (p.right + claims[i].left) / 2 + gap - gap / 2 : p.right + gap;
+        }
+        if (next >= 0) {
+            const Claim &q = claims[next];
+            right = q.wide ? (claims[i].right + q.left) / 2 - gap / 2 : q.left - gap;
+        }
+        if (right < left) right = left;
+        int x = left;
+        if (inkW[i] <= right - left)
+            x = std::min(std::max(it.x + it.width / 2 - inkW[i] / 2, left), right - inkW[i]);
+        places[i] = {{x, 0, right, height}, (fmt & ~(UINT)(DT_CENTER | DT_RIGHT)) | DT_LEFT};
+    }
+    return places;
 }
 
 void paint(HWND h, IconLet *d) {
@@ -69,14 +107,15 @@ void paint(HWND h, IconLet *d) {
     UINT fmt = DT_SINGLELINE | DT_VCENTER | DT_NOPREFIX;
     if (d->align == ICONLET_ALIGN_CENTER) fmt |= DT_CENTER;
     if (d->align == ICONLET_ALIGN_RIGHT) fmt |= DT_RIGHT;
-    std::vector<RECT> boxes = text_boxes(hdc, d, RECTW(rc), RECTH(rc));
+    std::vector<TextPlace> places = place_texts(hdc, d, fmt, RECTW(rc), RECTH(rc));
     for (size_t i = 0; i < d->items.size(); i++) {
         const ICONLET_ITEM &it = d->items[i];
         if (it.slot == d->pressed) {
             SetBrushColor(hdc, SysPixelIndex[d->skin.pressedBkColour]);
             FillBox(hdc, it.x, 0, it.width, RECTH(rc));
         }
-        DrawText(hdc, it.text, -1, &boxes[i], fmt);
+        // DrawText clips to the box.
+        DrawText(hdc, it.text, -1, &places[i].box, places[i].fmt);
     }
     EndPaint(h, hdc);
 }

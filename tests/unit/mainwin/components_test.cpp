@@ -266,6 +266,54 @@ TEST(BarTest, ALongTitleSpreadsIntoFreeRoomInsteadOfBeingCut) {
     EXPECT_EQ(tp_batteryshow_destroy(), 1);
 }
 
+// Texts without blanks: a gap of several background columns in the strip can only be the
+// room between two items.
+TEST(BarTest, TextsWiderThanTheirSlotKeepClearOfTheirNeighbours) {
+    ASSERT_TRUE(RegisterIconLetCtrl());
+    GuiThread gui(RECT{0, 40, kW, kH - 63});
+    RECT strip = {0, 0, kW, 42};
+    ASSERT_EQ(svr_create_batteryshow(gui.hwnd(), &strip, 1), 1);
+    // The strip's columns holding text, as runs [first, last + 1) split at 8 or more
+    // background columns.
+    auto runs = [&](const char *left, const char *middle, const char *right) {
+        EXPECT_EQ(tp_batteryshow_set_text_items(gui.hwnd(), left, middle, right), 1);
+        EXPECT_EQ(tp_batteryshow_update(gui.hwnd()), 1);
+        EXPECT_TRUE(idle());
+        const Uint32 bg = pixel(kW - 1, 1);
+        std::vector<std::pair<int, int>> out;
+        int blank = 1000;
+        for (int x = 0; x < kW; x++) {
+            if (count_not(RECT{x, 2, x + 1, 38}, bg) == 0) {
+                blank++;
+                continue;
+            }
+            if (out.empty() || blank >= 8)
+                out.push_back({x, x + 1});
+            else
+                out.back().second = x + 1;
+            blank = 0;
+        }
+        return out;
+    };
+    const int third = kW / 3;
+    // Two texts too wide for their slots beside each other, and a short one.
+    auto r = runs("NOTCHARGINGATALL", "BATTERYLOWPLEASECHARGENOW", "12%");
+    ASSERT_EQ(r.size(), 3u);
+    EXPECT_LE(r[0].second, third);  // the left text is cut at its own slot
+    EXPECT_GE(r[1].first, third);
+    EXPECT_GE(r[2].first, 2 * third);
+    // The same two apart: both use the free middle slot and share it.
+    r = runs("NOTCHARGINGATALL", "", "BATTERYLOWPLEASE");
+    ASSERT_EQ(r.size(), 2u);
+    EXPECT_GT(r[0].second, third);
+    EXPECT_LT(r[1].first, 2 * third);
+    // A short neighbour keeps its room and a long title stays clear of it on both sides.
+    r = runs("AB", "BATTERYTEMPERATURETOOHIGHNOW", "88%");
+    ASSERT_EQ(r.size(), 3u);
+    EXPECT_GT(r[1].second, 2 * third);  // the title uses the room the short texts leave
+    EXPECT_EQ(tp_batteryshow_destroy(), 1);
+}
+
 TEST(BarTest, SlotsAreThirdsOfTheWidth) {
     EXPECT_EQ(tp_bar_slot_at(0, 720), 0);
     EXPECT_EQ(tp_bar_slot_at(239, 720), 0);
