@@ -27,18 +27,40 @@ void repaint(HWND h, IconLet *d) {
     if (!d->locked) InvalidateRect(h, nullptr, TRUE);
 }
 
-// Where an item's text is drawn: the box it is clipped to and where it starts.
+// Where an item's text is drawn: the box it is clipped to and where it starts, and how
+// many of its bytes (-1: all).
 struct TextPlace {
     RECT box;
     UINT fmt;
+    int count;
 };
+
+// Bytes of the GB18030 character at s: 1, 2 or 4.
+int char_len(const char *s) {
+    unsigned char c = (unsigned char)s[0];
+    if (c < 0x81 || c == 0xFF || s[1] == '\0') return 1;
+    unsigned char c2 = (unsigned char)s[1];
+    if (c2 >= 0x30 && c2 <= 0x39) return s[2] != '\0' && s[3] != '\0' ? 4 : 1;
+    return 2;
+}
+
+// Bytes of the longest start of text, in whole characters, at most room pixels wide.
+int fitting_len(HDC hdc, const char *text, int room) {
+    int len = 0;
+    for (int next; text[len] != '\0'; len = next) {
+        next = len + char_len(text + len);
+        if (GetTextExtent(hdc, text, next, nullptr) > room) break;
+    }
+    return len;
+}
 
 // Where each item's text goes. A text that fits its slot sits in it as aligned. A centred
 // text wider than its slot (a long title) may spread into the room its neighbours leave
 // free: a slot without text, or the part of a neighbour's slot beyond that neighbour's
 // text; two wide texts share the free room between them. It stays centred where that room
-// allows, keeps a gap to every other text, and what still does not fit is cut at the end of
-// its room, its start readable. No text is drawn over, or run into, another.
+// allows, keeps a gap to every other text, and what still does not fit is cut after the
+// last whole character its room takes, its start readable. No text is drawn over, or run
+// into, another.
 std::vector<TextPlace> place_texts(HDC hdc, const IconLet *d, UINT fmt, int width, int height) {
     const size_t n = d->items.size();
     std::vector<TextPlace> places(n);
@@ -46,14 +68,15 @@ std::vector<TextPlace> place_texts(HDC hdc, const IconLet *d, UINT fmt, int widt
     int textH = 0;
     for (size_t i = 0; i < n; i++) {
         const ICONLET_ITEM &it = d->items[i];
-        places[i] = {{it.x, 0, it.x + it.width, height}, fmt};
+        places[i] = {{it.x, 0, it.x + it.width, height}, fmt, -1};
         SIZE size = {0, 0};
         if (it.text[0] != '\0') GetTextExtent(hdc, it.text, -1, &size);
         inkW[i] = size.cx;
         textH = std::max(textH, (int)size.cy);
     }
     if (d->align != ICONLET_ALIGN_CENTER) return places;
-    const int gap = std::max(4, textH / 2);
+    // About two characters: less reads as a blank inside one text.
+    const int gap = std::max(4, textH);
 
     // What each text holds: its ink when it fits its slot, the whole slot when it does not.
     struct Claim {
@@ -89,10 +112,13 @@ std::vector<TextPlace> place_texts(HDC hdc, const IconLet *d, UINT fmt, int widt
             right = q.wide ? (claims[i].right + q.left) / 2 - gap / 2 : q.left - gap;
         }
         if (right < left) right = left;
-        int x = left;
-        if (inkW[i] <= right - left)
+        int x = left, count = -1;
+        if (inkW[i] <= right - left) {
             x = std::min(std::max(it.x + it.width / 2 - inkW[i] / 2, left), right - inkW[i]);
-        places[i] = {{x, 0, right, height}, (fmt & ~(UINT)(DT_CENTER | DT_RIGHT)) | DT_LEFT};
+        } else {
+            count = fitting_len(hdc, it.text, right - left);
+        }
+        places[i] = {{x, 0, right, height}, (fmt & ~(UINT)(DT_CENTER | DT_RIGHT)) | DT_LEFT, count};
     }
     return places;
 }
@@ -115,7 +141,7 @@ void paint(HWND h, IconLet *d) {
             FillBox(hdc, it.x, 0, it.width, RECTH(rc));
         }
         // DrawText clips to the box.
-        DrawText(hdc, it.text, -1, &places[i].box, places[i].fmt);
+        DrawText(hdc, it.text, places[i].count, &places[i].box, places[i].fmt);
     }
     EndPaint(h, hdc);
 }
