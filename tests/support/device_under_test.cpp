@@ -195,6 +195,13 @@ bool DeviceUnderTest::startToMenu(int timeoutMs) {
         [&] { return console("windows").find("softkeybar") != std::string::npos; }, timeoutMs);
 }
 
+bool DeviceUnderTest::waitChannel(int timeoutMs) const {
+    // The command callback is registered once the socket listens.
+    return dut_wait_until(
+        [&] { return console("hw status").find("registerCommandProcess(") != std::string::npos; },
+        timeoutMs);
+}
+
 std::string DeviceUnderTest::console(const std::string &line) const {
     int fd = socket(AF_UNIX, SOCK_STREAM, 0);
     if (fd < 0) return "";

@@ -45,6 +45,9 @@ class DeviceUnderTest {
     bool waitConsole(int timeoutMs = 10000);
     // Starts and waits for the console and for the main menu's window.
     bool startToMenu(int timeoutMs = 15000);
+    // Waits until the PC channel takes commands: the application opens it on a thread of
+    // its own, which may come after the menu.
+    bool waitChannel(int timeoutMs = 10000) const;
 
     // One console request; the reply lines, the last being "OK" or "KO ...".
     std::string console(const std::string &line) const;

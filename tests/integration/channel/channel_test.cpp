@@ -43,8 +43,10 @@ class Channel : public ::testing::Test {
         }
         close(in[0]);
         stdin_ = in[1];
-        // The library writes its port once the channel thread has opened the socket.
-        for (int i = 0; i < 500 && port_ <= 0; i++) {
+        // The library writes its port once the channel thread has opened the socket (polled:
+        // a slow start under a sanitizer or a loaded machine only takes longer).
+        auto until = std::chrono::steady_clock::now() + std::chrono::seconds(30);
+        while (port_ <= 0 && std::chrono::steady_clock::now() < until) {
             std::this_thread::sleep_for(std::chrono::milliseconds(10));
             port_ = atoi(root_.read("/run/pc_port").c_str());
         }

@@ -60,7 +60,8 @@ TEST(StartupTest, FullApplicationStartsInOrder) {
              "mmi_CurrentWnd_ReadConfig", "g_ptScreenInfo.width= 720"}));
         EXPECT_TRUE(dut.exists("/cache/ftx/ftx.log"));
         // The PC channel answers.
-        EXPECT_GE(dut.pc("CloseDialog testItem start").first, 0);
+        ASSERT_TRUE(dut.waitChannel());
+        EXPECT_EQ(dut.pc("CloseDialog testItem start").first, 0);
     }
 }
 
@@ -105,6 +106,8 @@ TEST(StartupTest, AgingMarkerKeepsTheChannelClosed) {
     DeviceUnderTest dut;
     dut.write("/cache/ftx/rebootAging.txt", "1\n");
     ASSERT_TRUE(dut.startToMenu());
+    // The channel is started before the menu, when it is started at all.
+    EXPECT_EQ(dut.logPos("AtThreadStart begin"), std::string::npos);
     EXPECT_EQ(dut.pc("CloseDialog testItem start").first, -1);
 }
 
@@ -116,6 +119,7 @@ class RunningTest : public ::testing::Test {
         ASSERT_TRUE(dut_.startToMenu());
         // The first battery record has arrived (the title strip shows the charger).
         ASSERT_TRUE(dut_.waitLog("TitleInfoShow begin"));
+        ASSERT_TRUE(dut_.waitChannel());
     }
     std::string windows() { return dut_.console("windows"); }
     // Holds the power key until `until` holds (what the press must bring about), then lets

@@ -134,10 +134,12 @@ class Handset {
         dut.setEnv("FTX_TIME_SCALE", std::to_string(timeScale));
     }
 
-    // Up to the menu with the input layer running (a key-up nobody uses tells).
+    // Up to the menu with the input layer running (a key-up nobody uses tells) and the PC
+    // channel open.
     bool start() {
         return dut.startToMenu() &&
-               dut_wait_until([&] { return dut.consoleOk("key up 200"); }, 5000);
+               dut_wait_until([&] { return dut.consoleOk("key up 200"); }, 5000) &&
+               dut.waitChannel();
     }
     void key(int code) {
         std::string r = dut.console("key press " + std::to_string(code));
