@@ -191,8 +191,11 @@ bool DeviceUnderTest::waitConsole(int timeoutMs) {
 bool DeviceUnderTest::startToMenu(int timeoutMs) {
     if (!start() || !waitConsole(timeoutMs)) return false;
     // The menu is up once its soft-key bar exists.
-    return dut_wait_until(
-        [&] { return console("windows").find("softkeybar") != std::string::npos; }, timeoutMs);
+    if (!dut_wait_until([&] { return console("windows").find("softkeybar") != std::string::npos; },
+                        timeoutMs))
+        return false;
+    // The channel's thread is started before the menu, when it is started at all.
+    return logPos("AtThreadStart end") == std::string::npos || waitChannel(timeoutMs);
 }
 
 bool DeviceUnderTest::waitChannel(int timeoutMs) const {
@@ -238,6 +241,13 @@ std::string DeviceUnderTest::console(const std::string &line) const {
 bool DeviceUnderTest::consoleOk(const std::string &line) const {
     std::string r = console(line);
     return r.size() >= 3 && r.compare(r.size() - 3, 3, "OK\n") == 0;
+}
+
+bool DeviceUnderTest::waitDialogTakesKeys(int timeoutMs) const {
+    const std::string seen = "1203 Dialog hookKeyProc enter,msg=18,wparam=200,";
+    size_t before = logCount(seen);
+    return dut_wait_until(
+        [&] { return consoleOk("key up 200") && waitLogCount(seen, before + 1, 200); }, timeoutMs);
 }
 
 std::pair<int, std::string> DeviceUnderTest::pc(const std::string &line) const {

@@ -43,7 +43,8 @@ class DeviceUnderTest {
     bool start();
     // Waits until the console answers; false when the process ended or time ran out.
     bool waitConsole(int timeoutMs = 10000);
-    // Starts and waits for the console and for the main menu's window.
+    // Starts and waits for the console, for the main menu's window and, when the
+    // application starts the PC channel, for the channel to take commands.
     bool startToMenu(int timeoutMs = 15000);
     // Waits until the PC channel takes commands: the application opens it on a thread of
     // its own, which may come after the menu.
@@ -52,6 +53,10 @@ class DeviceUnderTest {
     // One console request; the reply lines, the last being "OK" or "KO ...".
     std::string console(const std::string &line) const;
     bool consoleOk(const std::string &line) const;
+    // Waits until the dialog that is up takes the keys. Its key hook is installed after the
+    // dialog shows, so a key sent as soon as the dialog is seen may still reach the window
+    // behind it: a key-up nobody uses is sent until the dialog's hook logs one.
+    bool waitDialogTakesKeys(int timeoutMs = 10000) const;
     // One PC command: the channel's result (0, 2, 3; -1 on a transport failure) and reply.
     std::pair<int, std::string> pc(const std::string &line) const;
 

@@ -7,6 +7,7 @@
 #include <stdio.h>
 #include <stdlib.h>
 
+#include <filesystem>
 #include <initializer_list>
 #include <string>
 #include <vector>
@@ -164,9 +165,6 @@ class Handset {
         std::string r = dut.console("key press " + std::to_string(code));
         EXPECT_NE(std::string::npos, r.find("OK")) << r;
     }
-    // Until input and windows have nothing left to do.
-    void idle() { dut.consoleOk("idle 3000"); }
-
     std::string activeCaption() {
         std::string w = dut.console("windows");
         size_t a = w.find("active=1");
@@ -186,13 +184,12 @@ class Handset {
     }
     // Rows: 0 full run, 1 information, 2 pretest 1, 3 pretest 2, 4.. the enabled items. The
     // list keeps its cursor: `row` counts from where the cursor is.
+    // Keys go to the active window, so the list must be in front before they are sent.
     void chooseRow(int row) {
         ASSERT_TRUE(waitActive("Device Test"));
-        idle();
         for (int i = 0; i < row; i++)
             key(108);
         key(28);
-        idle();
     }
     bool fromList(int row, const std::string &caption) {
         openDeviceList();
@@ -214,7 +211,16 @@ class Handset {
         EXPECT_TRUE(dut.consoleOk("screenshot " + path));
         Png png;
         EXPECT_TRUE(png.load(path));
+        keepForDocs(name, name);
         return png;
+    }
+    // FTX_DOCS_SHOTS collects the pictures for the documentation.
+    void keepForDocs(const std::string &name, const std::string &as) {
+        if (const char *dir = getenv("FTX_DOCS_SHOTS")) {
+            std::error_code ec;
+            std::filesystem::copy_file(dut.root() + "/" + name, std::string(dir) + "/" + as,
+                                       std::filesystem::copy_options::overwrite_existing, ec);
+        }
     }
     // Screenshots until pred holds for one (drawing follows the event that caused it);
     // the last one taken.

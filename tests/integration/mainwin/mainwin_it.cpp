@@ -60,7 +60,6 @@ TEST(StartupTest, FullApplicationStartsInOrder) {
              "mmi_CurrentWnd_ReadConfig", "g_ptScreenInfo.width= 720"}));
         EXPECT_TRUE(dut.exists("/cache/ftx/ftx.log"));
         // The PC channel answers.
-        ASSERT_TRUE(dut.waitChannel());
         EXPECT_EQ(dut.pc("CloseDialog testItem start").first, 0);
     }
 }
@@ -119,7 +118,6 @@ class RunningTest : public ::testing::Test {
         ASSERT_TRUE(dut_.startToMenu());
         // The first battery record has arrived (the title strip shows the charger).
         ASSERT_TRUE(dut_.waitLog("TitleInfoShow begin"));
-        ASSERT_TRUE(dut_.waitChannel());
     }
     std::string windows() { return dut_.console("windows"); }
     // Holds the power key until `until` holds (what the press must bring about), then lets
@@ -190,6 +188,7 @@ TEST_F(RunningTest, PcClosesTheDialogAndTheSecondButtonKeepsRunning) {
     // Open again and answer with the second button (key 61): no power-off.
     ASSERT_TRUE(holdPower([&] { return dut_.logCount(kDoModal) == 2; }));
     EXPECT_NE(windows().find(kDialogRect), std::string::npos);
+    ASSERT_TRUE(dut_.waitDialogTakesKeys());
     ASSERT_TRUE(dut_.consoleOk("key press 61"));
     EXPECT_TRUE(
         dut_wait_until([&] { return windows().find(kDialogRect) == std::string::npos; }, 5000));

@@ -56,6 +56,7 @@ TEST(DeviceList, RedrawsWhenTheRecordChangesWhileItIsOpen) {
     // one-button dialog's yes.
     h.chooseRow(0);
     ASSERT_TRUE(h.dut.waitLog("1203 Dialog DoModal=1"));
+    ASSERT_TRUE(h.dut.waitDialogTakesKeys());
     h.key(108);
     ASSERT_TRUE(h.waitActive("Vibration Test"));
     h.key(61);
@@ -72,7 +73,8 @@ TEST(RunEnd, AFullRunWithNothingToRunLeavesTheListTakingChoices) {
     ASSERT_TRUE(h.start());
     h.openDeviceList();
     h.chooseRow(0);
-    ASSERT_TRUE(h.dut.waitLog("mmi_AutoTestEntry begin."));
+    // The entry finds nothing to open before it returns.
+    ASSERT_TRUE(h.dut.waitLog(": no item to run"));
     EXPECT_EQ("Device Test", h.activeCaption());
     h.chooseRow(4);
     EXPECT_TRUE(h.waitActive("Vibration Test"));
@@ -93,6 +95,9 @@ TEST(RunEnd, APcStartThatClosesTheRunsWindowEndsTheRun) {
     EXPECT_EQ(std::string::npos, h.dut.logPos(kRefused));
     h.key(60);
     ASSERT_TRUE(h.waitActive("Device Test"));
+    // A pass in a run would record and open the next item after its window closed, on the
+    // GUI thread.
+    ASSERT_TRUE(h.dut.consoleOk("idle 5000"));
     EXPECT_EQ(0, h.result(316));
     EXPECT_EQ(std::string::npos, h.dut.logPos(kCardsOpened));
 }

@@ -1,225 +1,21 @@
 // The real ftx-mmi, headless: the vibrator window from the device-test list, automatic runs
 // with their summary items and restore files, the PC's vibrator, identity and battery
 // commands, and screenshots checked by their pixels.
-#include <png.h>
 #include <stdio.h>
 
 #include <chrono>
-#include <filesystem>
 #include <string>
-#include <vector>
 
 #include <gtest/gtest.h>
 
-#include "support/device_under_test.h"
+#include "support/handset.h"
+
+using namespace handset;
 
 namespace {
 
-const char *const kDomains[] = {
-    "FTX_SIMCARD",
-    "FTX_SDCARD",
-    "FTX_BATTERY",
-    "FTX_USBHOST",
-    "FTX_KEYS",
-    "FTX_TPSELF",
-    "FTX_TOUCH",
-    "FTX_SENSOR",
-    "FTX_HALLSENSOR",
-    "FTX_HALL_2ND",
-    "FTX_FINGERPRINT",
-    "FTX_NFC",
-    "FTX_CAMERA_BACK",
-    "FTX_AUX_CAMERA_BACK",
-    "FTX_CAMERA_FRONT",
-    "FTX_LCD",
-    "FTX_ALLLIGHT",
-    "FTX_SMARTPACAL",
-    "FTX_AUDIO_LOOPBACK",
-    "FTX_RINGTONE",
-    "FTX_RTUP",
-    "FTX_RTDOWN",
-    "FTX_RECEIVER",
-    "FTX_HOOKKEY",
-    "FTX_HEADSET_LOOPBACK",
-    "FTX_FM",
-    "FTX_AUDIO_MIC_HEADSET_LOOPBACK",
-    "FTX_AUDIO_AUXILIARYMIC1_HEADSET_LOOPBACK",
-    "FTX_AUDIO_AUXILIARYMIC2_HEADSET_LOOPBACK",
-    "FTX_HIFI",
-    "FTX_AUDIO_HEADSET_RECEIVER_LOOPBACK",
-    "FTX_AUDIO_HEADSET_SPEAKER_LOOPBACK",
-    "FTX_VIBRATOR",
-    "FTX_SAR",
-    "FTX_AuxiliarySAR",
-    "FTX_CARDS",
-    "FTX_AUDIO_MAINMICRECORD",
-    "FTX_AUXLCD_HINT",
-};
-
 // The card test has no window yet: its entry only logs, which is enough to see it opened.
 const char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not available yet";
-
-struct Item {
-    const char *domain;
-    int autoF, mmi, pre;
-};
-
-// Soft-key bar on 720x1280: y 1185..1280, each slot 240 wide.
-struct Png {
-    int w = 0, h = 0;
-    std::vector<unsigned char> rgb;
-    bool load(const std::string &path) {
-        FILE *fp = fopen(path.c_str(), "rb");
-        if (!fp) return false;
-        png_structp p = png_create_read_struct(PNG_LIBPNG_VER_STRING, nullptr, nullptr, nullptr);
-        png_infop info = png_create_info_struct(p);
-        if (setjmp(png_jmpbuf(p))) {
-            png_destroy_read_struct(&p, &info, nullptr);
-            fclose(fp);
-            return false;
-        }
-        png_init_io(p, fp);
-        png_read_info(p, info);
-        png_set_strip_alpha(p);
-        png_set_strip_16(p);
-        png_set_palette_to_rgb(p);
-        png_read_update_info(p, info);
-        w = (int)png_get_image_width(p, info);
-        h = (int)png_get_image_height(p, info);
-        rgb.assign((size_t)w * (size_t)h * 3, 0);
-        std::vector<png_bytep> rows((size_t)h);
-        for (int y = 0; y < h; y++)
-            rows[(size_t)y] = &rgb[(size_t)y * (size_t)w * 3];
-        png_read_image(p, rows.data());
-        png_destroy_read_struct(&p, &info, nullptr);
-        fclose(fp);
-        return true;
-    }
-    // Pixels of the box whose colour passes pred.
-    template <typename Pred>
-    int count(int x0, int y0, int x1, int y1, Pred pred) const {
-        int n = 0;
-        for (int y = y0; y < y1 && y < h; y++)
-            for (int x = x0; x < x1 && x < w; x++) {
-                const unsigned char *c = &rgb[((size_t)y * (size_t)w + (size_t)x) * 3];
-                if (pred(c[0], c[1], c[2])) n++;
-            }
-        return n;
-    }
-};
-
-bool light(int r, int g, int b) {
-    return r > 150 && g > 150 && b > 150;
-}
-bool green(int r, int g, int b) {
-    return g > 150 && r < 100 && b < 100;
-}
-bool red(int r, int g, int b) {
-    return r > 150 && g < 100 && b < 100;
-}
-
-class Handset {
-  public:
-    // Only the listed items are enabled; the run resumes only where a test asks for it.
-    explicit Handset(std::initializer_list<Item> items, double timeScale = 0.25) {
-        for (const char *d : kDomains)
-            dut.setConfig(d, "enable", "0");
-        for (const Item &i : items) {
-            dut.setConfig(i.domain, "enable", "1");
-            dut.setConfig(i.domain, "auto", std::to_string(i.autoF));
-            dut.setConfig(i.domain, "mmi", std::to_string(i.mmi));
-            dut.setConfig(i.domain, "pre", std::to_string(i.pre));
-        }
-        dut.setConfig("MMI", "restore_autotest", "0");
-        dut.setEnv("FTX_TIME_SCALE", std::to_string(timeScale));
-    }
-
-    // Up to the menu with the input layer running (a key-up nobody uses tells) and the PC
-    // channel open.
-    bool start() {
-        return dut.startToMenu() &&
-               dut_wait_until([&] { return dut.consoleOk("key up 200"); }, 5000) &&
-               dut.waitChannel();
-    }
-    void key(int code) {
-        std::string r = dut.console("key press " + std::to_string(code));
-        EXPECT_NE(std::string::npos, r.find("OK")) << r;
-    }
-
-    std::string activeCaption() {
-        std::string w = dut.console("windows");
-        size_t a = w.find("active=1");
-        if (a == std::string::npos) return "";
-        size_t c = w.find("caption=\"", a);
-        size_t e = w.find('"', c + 9);
-        return w.substr(c + 9, e - c - 9);
-    }
-    bool waitActive(const std::string &caption, int ms = 5000) {
-        return dut_wait_until([&] { return activeCaption() == caption; }, ms);
-    }
-    // From the main menu: "Device test" is its second row.
-    void openDeviceList() {
-        key(108);
-        key(28);
-        ASSERT_TRUE(waitActive("Device Test"));
-    }
-    // Rows: 0 full run, 1 information, 2 pretest 1, 3 pretest 2, 4.. the enabled items.
-    // Keys go to the active window, so the list must be in front before they are sent.
-    void chooseRow(int row) {
-        ASSERT_TRUE(waitActive("Device Test"));
-        for (int i = 0; i < row; i++)
-            key(108);
-        key(28);
-    }
-    // Device-test list, then a row, until the window of that caption is in front.
-    bool fromList(int row, const std::string &caption) {
-        openDeviceList();
-        chooseRow(row);
-        return waitActive(caption);
-    }
-    int result(int item) {
-        auto r = dut.pc("testinfoMoudle testItem " + std::to_string(item) + ",read");
-        EXPECT_EQ(0, r.first);
-        return r.second.empty() ? -1 : atoi(r.second.c_str());
-    }
-    void setResult(int item, int value) {
-        auto r = dut.pc("testinfoMoudle testItem " + std::to_string(item) + "," +
-                        std::to_string(value) + ",write");
-        EXPECT_EQ(0, r.first);
-    }
-    size_t count(const std::string &text) { return dut.logCount(text); }
-    Png shot(const std::string &name) {
-        std::string path = dut.root() + "/" + name;
-        EXPECT_TRUE(dut.consoleOk("screenshot " + path));
-        Png png;
-        EXPECT_TRUE(png.load(path));
-        keepForDocs(name, name);
-        return png;
-    }
-    // Screenshots until what the test waits for is on the screen (painting, and what a
-    // library callback brings, happen after the action that caused them); the last one.
-    template <typename Pred>
-    Png shotWhen(const std::string &name, Pred shows, int timeoutMs = 10000) {
-        Png png;
-        bool seen = dut_wait_until(
-            [&] {
-                png = shot(name);
-                return shows(png);
-            },
-            timeoutMs);
-        EXPECT_TRUE(seen) << name << ": the screen never showed what was waited for";
-        return png;
-    }
-    // FTX_DOCS_SHOTS collects the pictures for the documentation.
-    void keepForDocs(const std::string &name, const std::string &as) {
-        if (const char *dir = getenv("FTX_DOCS_SHOTS")) {
-            std::filesystem::copy_file(dut.root() + "/" + name, std::string(dir) + "/" + as,
-                                       std::filesystem::copy_options::overwrite_existing);
-        }
-    }
-
-    DeviceUnderTest dut;
-};
 
 const Item kVibrator = {"FTX_VIBRATOR", 1, 0, 1};
 
@@ -299,7 +95,7 @@ TEST(TestWindow, KeysOutsideARunLeaveTheRecordAlone) {
     // Pass works at once, long before the 3 s delay; the delay thread is ended with it.
     h.key(60);
     ASSERT_TRUE(h.waitActive("Device Test"));
-    EXPECT_EQ(1u, h.count("mmi_testwnd_proc pass"));
+    EXPECT_EQ(1u, h.dut.logCount("mmi_testwnd_proc pass"));
     h.chooseRow(0);  // the list keeps its place on the vibrator row
     ASSERT_TRUE(h.waitActive("Vibration Test"));
     h.key(61);
@@ -308,7 +104,7 @@ TEST(TestWindow, KeysOutsideARunLeaveTheRecordAlone) {
     EXPECT_EQ(0, h.result(64));
     // Each key ended its window's delay thread before the delay was over.
     ASSERT_TRUE(h.dut.waitLogCount("WaitForFoolProof stopped", 2));
-    EXPECT_EQ(0u, h.count("after sleep ,WaitForFoolProof"));
+    EXPECT_EQ(0u, h.dut.logCount("after sleep ,WaitForFoolProof"));
     EXPECT_NE(std::string::npos,
               h.dut.console("hw status").find("ftx_api_Vibrator_Test_Stop() x2"));
 }
@@ -335,7 +131,7 @@ TEST(Run, FailRecordsMarksTheSummaryAndEndsTheRun) {
     ASSERT_TRUE(dut_wait_until([&] { return h.result(66) == 2; }, 5000));
     EXPECT_EQ(2, h.result(316));
     EXPECT_EQ(2, h.result(64));
-    EXPECT_EQ(0u, h.count(kCardsOpened));
+    EXPECT_EQ(0u, h.dut.logCount(kCardsOpened));
     // The run is over: the list takes choices again.
     h.chooseRow(0);
     ASSERT_TRUE(h.waitActive("Vibration Test"));
@@ -353,7 +149,7 @@ TEST(Run, FullRunEndsWithThePreviewPassAndSwitchesTheMmiFlagOff) {
     EXPECT_EQ(1, h.result(316));
     EXPECT_EQ(1, h.result(64));
     EXPECT_EQ(0, h.result(66));
-    EXPECT_EQ(0u, h.count(kCardsOpened));
+    EXPECT_EQ(0u, h.dut.logCount(kCardsOpened));
     EXPECT_NE(std::string::npos, h.dut.read("/etc/ftx_config.ini").find("mmi_flag=0\r\n"));
     EXPECT_TRUE(h.waitActive("Device Test"));
 }
@@ -389,7 +185,7 @@ TEST(Restore, RunResumesAfterTheLastPassAcrossAReboot) {
     EXPECT_EQ(0, h.dut.pc("RebootMoudle testItem close").first);
     EXPECT_EQ(101, h.dut.wait(5000));
     ASSERT_TRUE(h.start());
-    ASSERT_TRUE(dut_wait_until([&] { return h.count(kCardsOpened) == 2; }, 5000));
+    ASSERT_TRUE(dut_wait_until([&] { return h.dut.logCount(kCardsOpened) == 2; }, 5000));
     EXPECT_FALSE(h.dut.exists("/data/pv_autotest_restore_flag"));
     EXPECT_FALSE(h.dut.exists("/data/pv_autotest_latest_pass"));
 }
@@ -437,7 +233,7 @@ TEST(Pc, VibratorIdentityBatteryAndDialog) {
     // The dialog's answer is acted on by the GUI thread right after the dialog is gone.
     ASSERT_TRUE(h.dut.waitLog("DestroyDialog end"));
     ASSERT_TRUE(h.dut.consoleOk("idle 5000"));
-    EXPECT_EQ(0u, h.count("mmi_AutoTestEntry begin."));
+    EXPECT_EQ(0u, h.dut.logCount("mmi_AutoTestEntry begin."));
 }
 
 TEST(Pc, StartClosesTheOpenTestWindowFirst) {
