@@ -248,6 +248,26 @@ void dialog_button(HWND hWnd, int button) {
 
 // ---- bars ----
 
+// The menu's title strip texts: charger, title (or the warning in force) and level. Drawn
+// only while the menu is in front; otherwise only its record is kept current, which a
+// battery warning shows over other windows.
+void refresh_title(HWND hWnd, bool draw) {
+    FTX_BATTERY_INFO b;
+    bool known = mmi_battery_snapshot(&b) == 0 && b.batteryLevel != -1;
+    char level[32] = "";
+    if (known) snprintf(level, sizeof level, "%d%%", b.batteryLevel);
+    int colour = known && b.batteryLevel <= g_batteryWarningVolt ? 12 : 19;
+    std::string charging = tr(known && mmi_battery_is_charging(&b) ? "BatteryCharging_Charging"
+                                                                   : "BatteryCharging_Null");
+    std::lock_guard<std::mutex> lk(s_titleMutex);
+    std::string title = s_titleWarning.empty() ? tr("title_factory") : s_titleWarning;
+    if (!s_titleWarning.empty()) colour = 12;
+    tp_batteryshow_set_text_items(hWnd, charging.c_str(), title.c_str(), level);
+    if (!draw) return;
+    tp_batteryshow_set_text_col(colour);
+    tp_batteryshow_update(hWnd);
+}
+
 void refresh_bars(HWND hWnd) {
     int state = mmi_wifi_link_state();
     const char *middleKey = nullptr;
@@ -262,20 +282,7 @@ void refresh_bars(HWND hWnd) {
     tp_skb_set_text_items(hWnd, " ", middle.c_str(), " ");
     tp_skb_set_text_col(middleColour);
     tp_skb_update(hWnd);
-
-    FTX_BATTERY_INFO b;
-    bool known = mmi_battery_snapshot(&b) == 0 && b.batteryLevel != -1;
-    char level[32] = "";
-    if (known) snprintf(level, sizeof level, "%d%%", b.batteryLevel);
-    int colour = known && b.batteryLevel <= g_batteryWarningVolt ? 12 : 19;
-    std::string charging = tr(known && mmi_battery_is_charging(&b) ? "BatteryCharging_Charging"
-                                                                   : "BatteryCharging_Null");
-    std::lock_guard<std::mutex> lk(s_titleMutex);
-    std::string title = s_titleWarning.empty() ? tr("title_factory") : s_titleWarning;
-    if (!s_titleWarning.empty()) colour = 12;
-    tp_batteryshow_set_text_items(hWnd, charging.c_str(), title.c_str(), level);
-    tp_batteryshow_set_text_col(colour);
-    tp_batteryshow_update(hWnd);
+    refresh_title(hWnd, true);
 }
 
 void draw_link_picture(HWND hWnd, bool up) {
@@ -303,7 +310,10 @@ void draw_link_picture(HWND hWnd, bool up) {
 
 void on_timer(HWND hWnd) {
     // The bars show the texts of the window in front; only refresh while that is the menu.
-    if (GetActiveWindow() != hWnd) return;
+    if (GetActiveWindow() != hWnd) {
+        refresh_title(hWnd, false);
+        return;
+    }
     refresh_bars(hWnd);
     if (!mmi_wifi_picture_enabled()) return;
     int state = mmi_wifi_link_state();

@@ -8,6 +8,7 @@
 #include <stdlib.h>
 
 #include <filesystem>
+#include <algorithm>
 #include <initializer_list>
 #include <string>
 #include <vector>
@@ -119,13 +120,17 @@ struct Png {
             }
         return n;
     }
-    // Per column of [0, w): 1 where some pixel of rows [y0, y1) differs from the colour at
-    // (bgX, bgY), the background of that band.
+    // Per column of [0, w): 1 where some pixel of rows [y0, y1) is a text's stroke on the
+    // background at (bgX, bgY): its brightest channel well above the background's. Edges
+    // smoothed into the background are left out, so a text marks the same columns in any
+    // of the light text colours.
     std::vector<int> inkColumns(int y0, int y1, int bgX, int bgY) const {
+        auto brightest = [](const unsigned char *c) { return std::max({c[0], c[1], c[2]}); };
+        const int bg = brightest(at(bgX, bgY));
         std::vector<int> ink((size_t)w, 0);
         for (int x = 0; x < w; x++)
             for (int y = y0; y < y1 && y < h; y++)
-                if (!same(x, y, bgX, bgY)) ink[(size_t)x] = 1;
+                if (brightest(at(x, y)) - bg > 100) ink[(size_t)x] = 1;
         return ink;
     }
 };

@@ -23,6 +23,16 @@ std::vector<unsigned char> strip(const Png &p) {
 std::vector<int> ink(const Png &p) {
     return p.inkColumns(2, kStripH - 2, p.w - 1, 1);
 }
+std::string runs(const Png &p) {
+    std::vector<int> in = ink(p);
+    std::string out;
+    for (int x = 0; x < p.w; x++)
+        if (in[(size_t)x] && (x == 0 || !in[(size_t)x - 1]))
+            out += " " + std::to_string(x);
+        else if (!in[(size_t)x] && x > 0 && in[(size_t)x - 1])
+            out += "-" + std::to_string(x);
+    return out;
+}
 int redIn(const Png &p, int x0, int x1) {
     return p.count(x0, 0, x1, kStripH, red);
 }
@@ -97,14 +107,18 @@ TEST_F(TitleStrip, LongTextsKeepClearOfTheirNeighbours) {
     EXPECT_GT(spread, 0);
 
     // "Not charging" nearly fills its slot and the low-battery warning is as wide: a gap
-    // stays between them, on the menu and over a test window.
+    // stays between them, on the menu and over a test window, where the level stays as
+    // current as on the menu.
     hw({"battery temperature 250", "charger none", "battery level 12"});
-    auto lowShown = [](const Png &p) {
+    auto lowShown = [&](const Png &p) {
         std::vector<int> in = ink(p);
         bool leftWide = false;  // "Not charging" starts further left than "Charging"
         for (int x = 0; x < 20; x++)
             leftWide = leftWide || in[(size_t)x];
-        return leftWide && redIn(p, kSlot, 2 * kSlot) > 50;
+        bool newLevel = false;  // "12%", no longer "80%"
+        for (int x = rightStart - 10; x < p.w; x++)
+            newLevel = newLevel || in[(size_t)x] != restInk[(size_t)x];
+        return leftWide && newLevel && redIn(p, kSlot, 2 * kSlot) > 50;
     };
     auto gapAtTheSlotEdge = [](const Png &p) {
         std::vector<int> in = ink(p);
@@ -120,6 +134,16 @@ TEST_F(TitleStrip, LongTextsKeepClearOfTheirNeighbours) {
     // The next battery round puts the warning over the test window.
     Png inWindow = h.shotWhen("strip_low_window.png", lowShown);
     EXPECT_EQ(-1, gapAtTheSlotEdge(inWindow));
+    EXPECT_EQ(ink(low), ink(inWindow)) << runs(low) << " / " << runs(inWindow);
+    // The level changes while the test window is in front: the strip over it follows.
+    hw({"battery level 11"});
+    const std::vector<int> twelve = ink(inWindow);
+    h.shotWhen("strip_low_window_11.png", [&](const Png &p) {
+        std::vector<int> in = ink(p);
+        for (int x = rightStart - 10; x < p.w; x++)
+            if (in[(size_t)x] != twelve[(size_t)x]) return lowShown(p);
+        return false;
+    });
 }
 
 }  // namespace
