@@ -150,7 +150,7 @@ TEST(Results, ConsoleItemWritesNeverUndoPcResults) {
     std::barrier round(2);
     std::atomic<bool> stop{false};
     std::thread console([&] {
-        for (int i = 0; !stop; i++) {
+        for (int i = 0;; i++) {
             round.arrive_and_wait();
             if (stop) break;
             dut.console("hw flags item 4 " + std::to_string(1 + i % 2));
