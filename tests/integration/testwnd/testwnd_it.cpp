@@ -123,18 +123,24 @@ TEST(Run, PassRecordsAndOpensTheNextItem) {
 }
 
 TEST(Run, FailRecordsMarksTheSummaryAndEndsTheRun) {
-    Handset h({kVibrator, kCards});
-    h.dut.setConfig("MMI", "pretest_menu_enable", "1");
-    ASSERT_TRUE(h.start());
-    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
-    h.key(61);
-    ASSERT_TRUE(dut_wait_until([&] { return h.result(66) == 2; }, 5000));
-    EXPECT_EQ(2, h.result(316));
-    EXPECT_EQ(2, h.result(64));
-    EXPECT_EQ(0u, h.dut.logCount(kCardsOpened));
-    // The run is over: the list takes choices again.
-    h.chooseRow(0);
-    ASSERT_TRUE(h.waitActive("Vibration Test"));
+    // With the pretest menu the fail also marks pretest 1's item 66 failed.
+    for (const char *pretestMenu : {"0", "1"}) {
+        SCOPED_TRACE(pretestMenu);
+        Handset h({kVibrator, kCards});
+        h.dut.setConfig("MMI", "pretest_menu_enable", pretestMenu);
+        ASSERT_TRUE(h.start());
+        ASSERT_TRUE(h.fromList(0, "Vibration Test"));
+        h.key(61);
+        // The summary item is written after the item itself, both before the window closes.
+        ASSERT_TRUE(h.waitActive("Device Test"));
+        EXPECT_EQ(2, h.result(316));
+        EXPECT_EQ(2, h.result(64));
+        EXPECT_EQ(std::string(pretestMenu) == "1" ? 2 : 0, h.result(66));
+        EXPECT_EQ(0u, h.dut.logCount(kCardsOpened));
+        // The run is over: the list takes choices again.
+        h.chooseRow(0);
+        ASSERT_TRUE(h.waitActive("Vibration Test"));
+    }
 }
 
 TEST(Run, FullRunEndsWithThePreviewPassAndSwitchesTheMmiFlagOff) {
@@ -152,6 +158,18 @@ TEST(Run, FullRunEndsWithThePreviewPassAndSwitchesTheMmiFlagOff) {
     EXPECT_EQ(0u, h.dut.logCount(kCardsOpened));
     EXPECT_NE(std::string::npos, h.dut.read("/etc/ftx_config.ini").find("mmi_flag=0\r\n"));
     EXPECT_TRUE(h.waitActive("Device Test"));
+}
+
+TEST(Run, WithTheMmiFlagOffOperatorJudgedItemsRunToo) {
+    Handset h({kVibrator, {"FTX_SAR", 0, 0, 1}, {"FTX_CARDS", 1, 1, 1}});
+    h.dut.setConfig("MMI", "mmi_flag", "0");
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.fromList(0, "Vibration Test"));
+    h.key(60);
+    ASSERT_TRUE(h.dut.waitLog(kCardsOpened));
+    EXPECT_EQ(1, h.result(316));
+    EXPECT_EQ(0, h.result(64));  // the run did not reach its end
+    EXPECT_NE(std::string::npos, h.dut.read("/etc/ftx_config.ini").find("mmi_flag=0\r\n"));
 }
 
 TEST(Run, PretestOneMarksSixtySixFailedUntilItsEndPretestTwoNeedsIt) {
