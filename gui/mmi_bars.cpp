@@ -441,6 +441,13 @@ HWND tp_batteryshow_window(void) {
 HWND tp_batteryshow_control(void) {
     return s_title.control;
 }
+int tp_batteryshow_has_items(HWND owner) {
+    if (s_title.lock < 0) return 0;
+    lock(s_title);
+    int found = find_locked(s_title, owner) != nullptr ? 1 : 0;
+    unlock(s_title);
+    return found;
+}
 int tp_skb_record_count(void) {
     return record_count(s_skb);
 }

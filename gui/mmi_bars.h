@@ -40,6 +40,8 @@ HWND tp_skb_window(void);
 HWND tp_skb_control(void);
 HWND tp_batteryshow_window(void);
 HWND tp_batteryshow_control(void);
+// 1 when owner has texts registered with the title strip.
+int tp_batteryshow_has_items(HWND owner);
 // Number of registry records of a bar (tests).
 int tp_skb_record_count(void);
 int tp_batteryshow_record_count(void);

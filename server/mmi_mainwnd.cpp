@@ -665,6 +665,13 @@ int TitleInfoShow(const char *text, int index, int abnormalState) {
         text = restore.c_str();
     }
     if (text) tp_batteryshow_set_text_items_byIndex(hub, text, index);
+    // A warning in force is shown over whatever window is in front. Otherwise the window in
+    // front keeps its own strip (a list's or a test's title), given back to it when a
+    // warning leaves; the menu's texts wait in its record until it is in front again.
+    HWND front = GetActiveWindow();
+    if (s_titleWarning.empty() && front != hub && front != HWND_INVALID && front != HWND_NULL &&
+        tp_batteryshow_has_items(front))
+        return tp_batteryshow_update(front);
     return tp_batteryshow_update(hub);
 }
 

@@ -144,6 +144,16 @@ TEST_F(TitleStrip, LongTextsKeepClearOfTheirNeighbours) {
             if (in[(size_t)x] != twelve[(size_t)x]) return lowShown(p);
         return false;
     });
+    // When the warning leaves, the test window gets its own strip back: its title alone,
+    // not the menu's charger and level.
+    hw({"charger usb 1"});
+    h.shotWhen("strip_window_back.png", [](const Png &p) {
+        std::vector<int> in = ink(p);
+        int sides = 0, middle = 0;
+        for (int x = 0; x < p.w; x++)
+            (x >= kSlot - 20 && x < 2 * kSlot + 20 ? middle : sides) += in[(size_t)x];
+        return redIn(p, 0, p.w) == 0 && sides == 0 && middle > 0;
+    });
 }
 
 }  // namespace

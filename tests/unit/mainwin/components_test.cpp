@@ -222,7 +222,9 @@ TEST(BarTest, TitleStripByIndexSettersCheckIndexAndOwner) {
     LogCapture log;
     EXPECT_EQ(tp_batteryshow_set_text_items_byIndex(gui.hwnd(), "x", 1), 0);
     EXPECT_TRUE(log.has("tp_batteryshow_set_text_items_byIndex pNode is NULL"));
+    EXPECT_EQ(tp_batteryshow_has_items(gui.hwnd()), 0);
     ASSERT_EQ(tp_batteryshow_set_text_items(gui.hwnd(), "L", "M", "R"), 1);
+    EXPECT_EQ(tp_batteryshow_has_items(gui.hwnd()), 1);
     EXPECT_EQ(tp_batteryshow_set_text_items_byIndex(gui.hwnd(), "x", 3), 0);
     EXPECT_TRUE(log.has("tp_batteryshow_set_text_items_byIndex index error = 3"));
     ASSERT_EQ(tp_batteryshow_set_text_items_byIndex(gui.hwnd(), "Hot", 1), 1);
