@@ -1,9 +1,12 @@
 // ftx-console: the emulator console's client.
-//   ftx-console [-s SOCKET] [LINE...]   sends one request (the words joined) and prints the
-//                                      reply; without words it reads requests from stdin.
-// The socket is $FTX_CONSOLE, else $FTX_ROOT/run/console.sock, else ./root (or the demo's
-// ./root-demo). Exit status: 0 OK, 2 KO,
-// 1 when the console cannot be reached.
+//   ftx-console [-s SOCKET] [--root DIR] [LINE...]   sends one request (the words joined) and
+//                                      prints the reply; without words it reads requests from
+//                                      stdin.
+// The socket is -s, else DIR/run/console.sock, else $FTX_CONSOLE, else
+// $FTX_ROOT/run/console.sock, else the root ./ftx run makes ($FTX_TOP or the current folder:
+// root, or the demo's root-demo). Exit status: 0 OK, 2 KO, 1 when the console cannot be
+// reached.
+#include <getopt.h>
 #include <limits.h>
 #include <stdio.h>
 #include <stdlib.h>
@@ -62,32 +65,57 @@ int ask(int fd, const std::string &line) {
     return 1;
 }
 
+void usage(FILE *to) {
+    fputs(
+        "usage: ftx-console [-s SOCKET] [--root DIR] [LINE...]\n"
+        "  sends LINE (its words joined by blanks) to the emulator console and prints the\n"
+        "  reply (\"help\" lists the console's commands); without a line it reads lines\n"
+        "  from standard input. Exit status: 0 OK, 2 KO, 1 the console cannot be reached.\n"
+        "  the socket: -s, else DIR/run/console.sock, else FTX_CONSOLE, else\n"
+        "  $FTX_ROOT/run/console.sock, else ./root (or the demo's ./root-demo)\n",
+        to);
+}
+
+std::string default_socket() {
+    const char *env = getenv("FTX_CONSOLE");
+    const char *root = getenv("FTX_ROOT");
+    if (env != nullptr && *env != '\0') return env;
+    if (root != nullptr && *root != '\0') return std::string(root) + "/run/console.sock";
+    const char *top = getenv("FTX_TOP");
+    std::string base = top != nullptr && *top != '\0' ? std::string(top) + "/" : "";
+    std::string run = base + "root/run/console.sock", demo = base + "root-demo/run/console.sock";
+    // The demo's root, when only the demo is running.
+    if (access(demo.c_str(), F_OK) == 0 && access(run.c_str(), F_OK) != 0) return demo;
+    return run;
+}
+
 }  // namespace
 
 int main(int argc, char **argv) {
     std::string path;
-    int first = 1;
-    if (argc > 2 && strcmp(argv[1], "-s") == 0) {
-        path = argv[2];
-        first = 3;
-    } else if (argc > 1 && (strcmp(argv[1], "-h") == 0 || strcmp(argv[1], "--help") == 0)) {
-        printf(
-            "usage: ftx-console [-s SOCKET] [LINE...]   (\"help\" lists the console's commands)\n");
-        return 0;
+    const option longopts[] = {{"help", no_argument, nullptr, 'h'},
+                               {"root", required_argument, nullptr, 'r'},
+                               {nullptr, 0, nullptr, 0}};
+    int opt;
+    while ((opt = getopt_long(argc, argv, "+s:h", longopts, nullptr)) != -1) {
+        switch (opt) {
+            case 's':
+                path = optarg;
+                break;
+            case 'r':
+                // -s names the socket itself and wins over a root.
+                if (path.empty()) path = std::string(optarg) + "/run/console.sock";
+                break;
+            case 'h':
+                usage(stdout);
+                return 0;
+            default:
+                usage(stderr);
+                return 1;
+        }
     }
-    if (path.empty()) {
-        const char *env = getenv("FTX_CONSOLE");
-        const char *root = getenv("FTX_ROOT");
-        if (env != nullptr && *env != '\0')
-            path = env;
-        else if (root != nullptr && *root != '\0')
-            path = std::string(root) + "/run/console.sock";
-        else if (access("root-demo/run/console.sock", F_OK) == 0 &&
-                 access("root/run/console.sock", F_OK) != 0)
-            path = "root-demo/run/console.sock";  // the demo's root
-        else
-            path = "root/run/console.sock";
-    }
+    int first = optind;
+    if (path.empty()) path = default_socket();
     int fd = connect_to(path);
     if (fd < 0) {
         fprintf(stderr,

@@ -1,7 +1,8 @@
 // ftx-pc: the test station's client for the handset's command channel.
-//   ftx-pc [-H HOST] [-p PORT] COMMAND...   sends one command, prints the reply; the exit
-//                                           status is the result (0, 2, 3; 1 no connection)
-//   ftx-pc [-H HOST] [-p PORT]              interactive prompt ("history", "!!", "!N")
+//   ftx-pc [-H HOST] [-p PORT] [--root DIR] COMMAND...   sends one command, prints the
+//                               reply; the exit status is the result (0, 2, 3; 1 no connection)
+//   ftx-pc [-H HOST] [-p PORT] [--root DIR]              interactive prompt ("history", "!!")
+#include <getopt.h>
 #include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
@@ -10,14 +11,36 @@
 #include <string>
 #include <vector>
 
+#include "ftx_host.h"
 #include "pc_client.h"
+#include "pc_port.h"
 
 namespace {
 
-void usage() {
-    fprintf(stderr,
-            "usage: ftx-pc [-H HOST] [-p PORT] [COMMAND...]\n"
-            "  without a command: an interactive prompt (history, !!, !N, quit)\n");
+void usage(FILE *to) {
+    fputs(
+        "usage: ftx-pc [-H HOST] [-p PORT] [--root DIR] [COMMAND...]\n"
+        "  sends COMMAND (its words joined by blanks), prints the reply and exits with the\n"
+        "  result: 0 done, 2 not understood, 3 not possible here, 1 no connection\n"
+        "  without a command: an interactive prompt (history, !!, !N, quit)\n"
+        "  the port: -p, else FTX_PC_PORT, else [pc] port of the device root's\n"
+        "  sim/device.ini; the root: --root DIR, else FTX_ROOT, else ./root\n",
+        to);
+}
+
+// The device root whose settings give the port: --root, else FTX_ROOT, else the root
+// that ./ftx run makes by default (FTX_TOP/root when the launcher runs us, else ./root).
+void choose_root(const char *root) {
+    if (root == nullptr) {
+        const char *env = getenv("FTX_ROOT");
+        if (env != nullptr && *env != '\0') return;
+        const char *top = getenv("FTX_TOP");
+        std::string dflt = std::string(top != nullptr && *top != '\0' ? top : ".") + "/root";
+        setenv("FTX_ROOT", dflt.c_str(), 1);
+    } else {
+        setenv("FTX_ROOT", root, 1);
+    }
+    ftx_host_reset();
 }
 
 void print_reply(const std::string &reply) {
@@ -114,22 +137,49 @@ int interactive(ftxpc::PcClient &client, const char *host, int port) {
 
 int main(int argc, char **argv) {
     const char *host = "127.0.0.1";
+    const char *root = nullptr;
     int port = 0;
+    const option longopts[] = {{"help", no_argument, nullptr, 'h'},
+                               {"root", required_argument, nullptr, 'r'},
+                               {nullptr, 0, nullptr, 0}};
     int opt;
-    while ((opt = getopt(argc, argv, "+H:p:h")) != -1) {
+    while ((opt = getopt_long(argc, argv, "+H:p:h", longopts, nullptr)) != -1) {
         switch (opt) {
             case 'H':
                 host = optarg;
                 break;
             case 'p':
-                port = atoi(optarg);
+                if (!ftxsim::pc_port_parse(optarg, &port) || port == 0) {
+                    fprintf(stderr, "ftx-pc: -p %s: the port is a number 1..65535\n", optarg);
+                    return 1;
+                }
                 break;
+            case 'r':
+                root = optarg;
+                break;
+            case 'h':
+                usage(stdout);
+                return 0;
             default:
-                usage();
-                return opt == 'h' ? 0 : 1;
+                usage(stderr);
+                return 1;
         }
     }
-    if (port <= 0) port = ftxpc::default_port();
+    if (port == 0) {
+        choose_root(root);
+        ftxsim::PcPortSetting s = ftxsim::pc_port_setting();
+        if (!s.ok || s.port == 0) {
+            fprintf(stderr, "ftx-pc: %s \"%s\" is not a port number (1..65535)\n", s.source,
+                    s.text);
+            return 1;
+        }
+        if (root != nullptr && strcmp(s.source, "default") == 0) {
+            fprintf(stderr, "ftx-pc: no [pc] port in %s/sim/device.ini (is it a device root?)\n",
+                    root);
+            return 1;
+        }
+        port = s.port;
+    }
     ftxpc::PcClient client;
     if (client.connect_to(host, port) != 0) {
         fprintf(stderr, "ftx-pc: cannot connect to %s:%d\n", host, port);

@@ -11,8 +11,6 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
-#include "ftx_host.h"
-
 namespace ftxpc {
 
 PcClient::~PcClient() {
@@ -63,6 +61,10 @@ int PcClient::send_raw(const std::string &bytes) {
     return 0;
 }
 
+int PcClient::finish_sending() {
+    return fd_ >= 0 ? shutdown(fd_, SHUT_WR) : -1;
+}
+
 bool PcClient::fill(int timeout_ms) {
     pollfd p{fd_, POLLIN, 0};
     int r = poll(&p, 1, timeout_ms);
@@ -96,12 +98,6 @@ int PcClient::read_answer(std::string *reply, int timeout_ms) {
 int PcClient::command(const std::string &line, std::string *reply, int timeout_ms) {
     if (send_raw(line + "\n") != 0) return -1;
     return read_answer(reply, timeout_ms);
-}
-
-int default_port() {
-    const char *env = getenv("FTX_PC_PORT");
-    if (env != nullptr && *env != '\0') return atoi(env);
-    return ftx_device_ini_get_int("pc", "port", 20051);
 }
 
 }  // namespace ftxpc

@@ -19,6 +19,8 @@ class PcClient {
     bool connected() const { return fd_ >= 0; }
     // Sends raw bytes as they are (no line end added); 0 or -1.
     int send_raw(const std::string &bytes);
+    // Tells the handset no more commands come; answers can still be read. 0 or -1.
+    int finish_sending();
     // Reads one answer; returns its result (0, 2, 3) and fills reply, or -1 when the
     // connection broke or the answer was malformed.
     int read_answer(std::string *reply, int timeout_ms = 30000);
@@ -30,9 +32,5 @@ class PcClient {
     int fd_ = -1;
     std::string in_;
 };
-
-// The channel's port for this machine: FTX_PC_PORT, else [pc] port of the device root's
-// sim/device.ini, else the library's default.
-int default_port();
 
 }  // namespace ftxpc
