@@ -3,6 +3,8 @@
 #include <stdlib.h>
 #include <unistd.h>
 
+#include <filesystem>
+
 #include "AtThread.h"
 #include "unit/gui/gui_harness.h"
 
@@ -16,16 +18,27 @@ static ::testing::Environment *const g_env = [] {
 
 namespace {
 
+// Threads of this process.
+size_t threads() {
+    size_t n = 0;
+    for (const auto &e : std::filesystem::directory_iterator("/proc/self/task")) {
+        (void)e;
+        n++;
+    }
+    return n;
+}
+
 TEST(Relink, OneF4KeyDownWhenTheRestartFileExists) {
     GuiThread main;
+    const size_t base = threads();
     EXPECT_EQ(0, mmi_start_tcp_relink(main.hwnd()));
-    usleep(150 * 1000);
-    EXPECT_TRUE(log().of(main.hwnd(), MSG_KEYDOWN).empty());
+    EXPECT_EQ(base, threads()) << "a relink thread without the restart file";
 
     GuiEnvironment::root_->write("/cache/Tcp_Restart.ini", "[tcp]\n");
     EXPECT_EQ(1, mmi_start_tcp_relink(main.hwnd()));
     ASSERT_TRUE(wait_until([&] { return !log().of(main.hwnd(), MSG_KEYDOWN).empty(); }));
-    usleep(150 * 1000);
+    // Once the thread has ended nothing more can come from it.
+    ASSERT_TRUE(wait_until([&] { return threads() == base; }));
     std::vector<Rec> keys = log().of(main.hwnd(), MSG_KEYDOWN);
     ASSERT_EQ(1u, keys.size());
     EXPECT_EQ(static_cast<WPARAM>(SCANCODE_F4), keys[0].wp);
