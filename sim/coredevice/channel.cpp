@@ -378,8 +378,9 @@ class Loop {
                 __android_log_print(ANDROID_LOG_INFO, kTag, "PC clients are accepted again");
             }
             if (clients_.size() >= kChannelMaxClients) {
-                close(fd);
+                // Counted before the client can see its end.
                 g_refused.fetch_add(1, std::memory_order_relaxed);
+                close(fd);
                 if (!at_cap_) {
                     at_cap_ = true;
                     __android_log_print(ANDROID_LOG_WARN, kTag,
@@ -415,9 +416,9 @@ class Loop {
         int waiting = 0;
         for (auto &c : clients_)
             waiting += c->has_held() || !may_serve(*c);
-        g_clients.store(static_cast<int>(clients_.size()), std::memory_order_relaxed);
-        g_unsent.store(total_, std::memory_order_relaxed);
-        g_waiting.store(waiting, std::memory_order_relaxed);
+        g_clients.store(static_cast<int>(clients_.size()), std::memory_order_release);
+        g_unsent.store(total_, std::memory_order_release);
+        g_waiting.store(waiting, std::memory_order_release);
     }
 
     int listen_;
