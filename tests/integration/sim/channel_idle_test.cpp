@@ -88,4 +88,25 @@ TEST_F(Channel, ACommandLongerThanTheIdleTimeClosesNoClient) {
     EXPECT_EQ(figures()["idle_closed"], closedBefore);
 }
 
+// The interactive ftx-pc opens its connection again when the handset closed it for idleness:
+// the operator sees the answer, not a lost connection.
+TEST_F(Channel, ThePcPromptReconnectsAfterAnIdleClose) {
+    long closedBefore = figures()["idle_closed"];
+    std::string out = root_.path() + "/prompt.txt";
+    std::string cmd = std::string(getenv("FTX_BUILD_DIR")) + "/bin/ftx-pc -p " +
+                      std::to_string(port_) + " > " + out + " 2>&1";
+    FILE *prompt = popen(("HOME=" + root_.path() + " " + cmd).c_str(), "w");
+    ASSERT_NE(prompt, nullptr);
+    fputs("echo before\n", prompt);
+    fflush(prompt);
+    EXPECT_TRUE(wait_until(
+        [&] { return root_.read("/prompt.txt").find("[0] before") != std::string::npos; }));
+    EXPECT_TRUE(wait_until([&] { return figures()["idle_closed"] == closedBefore + 1; }));
+    fputs("echo after\n", prompt);
+    EXPECT_EQ(pclose(prompt), 0);
+    std::string said = root_.read("/prompt.txt");
+    EXPECT_NE(said.find("[0] after"), std::string::npos) << said;
+    EXPECT_EQ(said.find("lost"), std::string::npos) << said;
+}
+
 }  // namespace
