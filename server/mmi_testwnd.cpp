@@ -162,6 +162,7 @@ int Check_AllTestWnd_Closed(void) {
     }
     // A run waits for a key in its window; with the window gone no pass or fail can come.
     if (closed > 0 && g_bAutoTestRunning == 1) mmi_autotest_end_run("test window closed");
+    if (closed > 0) g_bMonomerPreviewRunning = 0;  // the same for a preview
     return closed;
 }
 

@@ -9,6 +9,7 @@
 #include <gtest/gtest.h>
 
 #include "mmi_autotest.h"
+#include "mmi_monomer.h"
 #include "mmi_runstate.h"
 #include "mmi_settings.h"
 #include "mmi_testwnd.h"
@@ -465,6 +466,11 @@ TEST_F(Sequence, ClosingTheRunsWindowFromOutsideEndsTheRun) {
     EXPECT_EQ(1, Check_AllTestWnd_Closed());
     EXPECT_EQ(AUTOTEST_MODE_PRETEST1, g_autoTestMode.load());
     EXPECT_TRUE(rec.results.empty());
+    // The monomer preview ends the same way.
+    g_bMonomerPreviewRunning = 1;
+    mmi_testwnd_register_open(fake, fake_stop);
+    EXPECT_EQ(1, Check_AllTestWnd_Closed());
+    EXPECT_EQ(0, g_bMonomerPreviewRunning.load());
 }
 
 TEST_F(Sequence, ItemThatCannotOpenEndsTheRunWithoutARecord) {
