@@ -227,15 +227,17 @@ class Handset {
                                        std::filesystem::copy_options::overwrite_existing, ec);
         }
     }
-    // Screenshots until pred holds for one (drawing follows the event that caused it);
-    // the last one taken.
+    // Screenshots until pred holds (drawing follows the event that caused it); the last one
+    // taken. A screenshot may catch a window half painted, so the picture must also be
+    // the same twice in a row.
     template <typename Pred>
     Png shotWhen(const std::string &name, Pred pred, int timeoutMs = 10000) {
-        Png png;
+        Png png, previous;
         bool seen = dut_wait_until(
             [&] {
+                previous = std::move(png);
                 png = shot(name);
-                return pred(png);
+                return pred(png) && png.rgb == previous.rgb;
             },
             timeoutMs);
         EXPECT_TRUE(seen) << name << ": the screen never showed what was waited for";
