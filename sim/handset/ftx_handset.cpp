@@ -15,6 +15,8 @@
 #include <string>
 #include <vector>
 
+#include "shell_line.h"
+
 namespace {
 
 enum class Kind {
@@ -29,19 +31,19 @@ struct Tool {
 };
 
 const Tool kTools[] = {
-    {"toybox", Kind::Toybox},           {"cat", Kind::FileApplet},
-    {"chmod", Kind::FileApplet},        {"cp", Kind::FileApplet},
-    {"echo", Kind::FileApplet},         {"false", Kind::FileApplet},
-    {"grep", Kind::FileApplet},         {"head", Kind::FileApplet},
-    {"ls", Kind::FileApplet},           {"mkdir", Kind::FileApplet},
-    {"mv", Kind::FileApplet},           {"rm", Kind::FileApplet},
-    {"sleep", Kind::FileApplet},        {"sync", Kind::FileApplet},
-    {"tail", Kind::FileApplet},         {"touch", Kind::FileApplet},
-    {"true", Kind::FileApplet},         {"wc", Kind::FileApplet},
-    {"dhcpcd", Kind::Recorder},
-    {"dhcptool", Kind::Recorder},         {"insmod", Kind::Recorder},
-    {"iwpriv", Kind::Recorder},         {"mmi_open_fb1", Kind::Recorder},
-    {"ptt_socket_app", Kind::Recorder}, {"rmmod", Kind::Recorder},
+    {"toybox", Kind::Toybox},         {"cat", Kind::FileApplet},
+    {"chmod", Kind::FileApplet},      {"cp", Kind::FileApplet},
+    {"echo", Kind::FileApplet},       {"false", Kind::FileApplet},
+    {"grep", Kind::FileApplet},       {"head", Kind::FileApplet},
+    {"ls", Kind::FileApplet},         {"mkdir", Kind::FileApplet},
+    {"mv", Kind::FileApplet},         {"rm", Kind::FileApplet},
+    {"sleep", Kind::FileApplet},      {"sync", Kind::FileApplet},
+    {"tail", Kind::FileApplet},       {"touch", Kind::FileApplet},
+    {"true", Kind::FileApplet},       {"wc", Kind::FileApplet},
+    {"dhcpcd", Kind::Recorder},       {"dhcptool", Kind::Recorder},
+    {"insmod", Kind::Recorder},       {"iwpriv", Kind::Recorder},
+    {"mmi_open_fb1", Kind::Recorder}, {"ptt_socket_app", Kind::Recorder},
+    {"rmmod", Kind::Recorder},
 };
 
 const char kSelf[] = "ftx-handset";
@@ -65,28 +67,6 @@ std::string real_root() {
     return buf;
 }
 
-// "." and ".." of an absolute host path resolved by the words alone.
-std::string lexical(const std::string &path) {
-    std::vector<std::string> parts;
-    size_t i = 0;
-    while (i <= path.size()) {
-        size_t end = path.find('/', i);
-        if (end == std::string::npos) end = path.size();
-        std::string part = path.substr(i, end - i);
-        i = end + 1;
-        if (part.empty() || part == ".") continue;
-        if (part == "..") {
-            if (!parts.empty()) parts.pop_back();
-        } else {
-            parts.push_back(part);
-        }
-    }
-    std::string out;
-    for (const std::string &p : parts)
-        out += "/" + p;
-    return out.empty() ? "/" : out;
-}
-
 bool under(const std::string &path, const std::string &folder) {
     return path.compare(0, folder.size(), folder) == 0 &&
            (path.size() == folder.size() || path[folder.size()] == '/');
@@ -96,11 +76,13 @@ bool under(const std::string &path, const std::string &folder) {
 bool inside_root(const std::string &arg, const std::string &root) {
     char cwd[PATH_MAX];
     if (getcwd(cwd, sizeof(cwd)) == nullptr) return false;
-    std::string path = lexical(arg[0] == '/' ? arg : std::string(cwd) + "/" + arg);
+    std::string path =
+        ftxhost::normalise_device_path(arg[0] == '/' ? arg : std::string(cwd) + "/" + arg);
     std::string rest;
     while (true) {
         char real[PATH_MAX];
-        if (realpath(path.c_str(), real) != nullptr) return under(lexical(real + rest), root);
+        if (realpath(path.c_str(), real) != nullptr)
+            return under(ftxhost::normalise_device_path(real + rest), root);
         if (path == "/") return false;
         size_t slash = path.rfind('/');
         rest = path.substr(slash) + rest;

@@ -19,6 +19,8 @@
 #include <sstream>
 #include <thread>
 
+#include "support/host_io.h"
+
 namespace fs = std::filesystem;
 
 namespace {
@@ -39,16 +41,6 @@ void set_timeouts(int fd, int seconds) {
     timeval tv{seconds, 0};
     setsockopt(fd, SOL_SOCKET, SO_RCVTIMEO, &tv, sizeof tv);
     setsockopt(fd, SOL_SOCKET, SO_SNDTIMEO, &tv, sizeof tv);
-}
-
-bool send_all(int fd, const std::string &s) {
-    size_t off = 0;
-    while (off < s.size()) {
-        ssize_t n = send(fd, s.data() + off, s.size() - off, MSG_NOSIGNAL);
-        if (n <= 0) return false;
-        off += static_cast<size_t>(n);
-    }
-    return true;
 }
 
 std::string slurp(const std::string &path) {

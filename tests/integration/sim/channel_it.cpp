@@ -16,6 +16,7 @@
 
 #include "channel.h"
 #include "channel_probe.h"
+#include "support/host_io.h"
 #include "support/device_under_test.h"
 
 namespace {
@@ -65,28 +66,6 @@ int listening_sockets(pid_t pid) {
         }
     }
     return n;
-}
-
-std::string run(const std::string &cmd, int *status) {
-    FILE *p = popen(cmd.c_str(), "r");
-    std::string out;
-    char buf[4096];
-    size_t n;
-    while ((n = fread(buf, 1, sizeof(buf), p)) > 0)
-        out.append(buf, n);
-    int st = pclose(p);
-    *status = WIFEXITED(st) ? WEXITSTATUS(st) : -1;
-    return out;
-}
-
-bool send_all(int fd, const std::string &s) {
-    size_t off = 0;
-    while (off < s.size()) {
-        ssize_t n = send(fd, s.data() + off, s.size() - off, MSG_NOSIGNAL);
-        if (n <= 0) return false;
-        off += static_cast<size_t>(n);
-    }
-    return true;
 }
 
 // Reads exactly n bytes (less when the connection ends or nothing comes for 30 s).

@@ -19,6 +19,7 @@
 
 #include "channel.h"
 #include "channel_fixture.h"
+#include "support/host_io.h"
 
 namespace {
 
@@ -125,18 +126,6 @@ TEST_F(Channel, FileReadsAnswerWithTheFilesBytes) {
     EXPECT_EQ(reply, std::string("*a\0b\nc", 6));
     EXPECT_EQ(c.command("read /data/../../etc/passwd", &reply), 0);
     EXPECT_EQ(reply, "ERROR \"..\" is not allowed");
-}
-
-std::string run(const std::string &cmd, int *status) {
-    FILE *p = popen(cmd.c_str(), "r");
-    std::string out;
-    char buf[4096];
-    size_t n;
-    while ((n = fread(buf, 1, sizeof(buf), p)) > 0)
-        out.append(buf, n);
-    int st = pclose(p);
-    *status = WIFEXITED(st) ? WEXITSTATUS(st) : -1;
-    return out;
 }
 
 TEST_F(Channel, PcToolExitStatusIsTheResult) {
