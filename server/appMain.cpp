@@ -9,13 +9,13 @@
 #include <tp_os.h>
 #include <unistd.h>
 
-#include "AtThread.h"
-#include "ftx_lib_binding.h"
+#include "adbd_connection/AtThread.h"
+#include "core/ftx_lib_binding.h"
 #include "ftx_log.h"
-#include "mmi_autotest_config.h"
+#include "core/mmi_autotest_config.h"
 #include "mmi_iconlet.h"
-#include "mmi_mainwnd.h"
-#include "mmi_settings.h"
+#include "hub/mmi_mainwnd.h"
+#include "core/mmi_settings.h"
 
 #define TAG "DVK_FTX"
 #define LOGD(...) __android_log_print(ANDROID_LOG_DEBUG, TAG, __VA_ARGS__)

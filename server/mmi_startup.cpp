@@ -6,10 +6,10 @@
 #include <tp_os.h>
 #include <unistd.h>
 
-#include "ftx_lib_binding.h"
-#include "mmi_mainwnd.h"
-#include "mmi_power.h"
-#include "mmi_settings.h"
+#include "core/ftx_lib_binding.h"
+#include "hub/mmi_mainwnd.h"
+#include "core/mmi_power.h"
+#include "core/mmi_settings.h"
 
 namespace {
 

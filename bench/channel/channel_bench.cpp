@@ -19,8 +19,8 @@
 #include <thread>
 #include <vector>
 
-#include "AtThread.h"
-#include "ftx_lib_binding.h"
+#include "adbd_connection/AtThread.h"
+#include "core/ftx_lib_binding.h"
 
 namespace {
 

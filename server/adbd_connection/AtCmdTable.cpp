@@ -1,14 +1,14 @@
 // The PC command table, in the order the station PCs expect (earlier rows are tried
 // first; of several prefix matches with empty actions the last wins). The module words'
 // misspellings are the protocol's.
-#include "AtCmdTable.h"
+#include "adbd_connection/AtCmdTable.h"
 
 #include <stdint.h>
 
 #include <android/log.h>
 
-#include "AutoTestHandlers.h"
-#include "autotest_handlers_device.h"
+#include "adbd_connection/AutoTestHandlers.h"
+#include "adbd_connection/autotest_handlers_device.h"
 #include "mmi_dialog.h"
 
 // A row whose handler arrives with its test; the name says which.

@@ -1,7 +1,7 @@
 // The PC command table: 179 rows registered in order at channel start.
 #pragma once
 
-#include "CmdParse.h"
+#include "adbd_connection/CmdParse.h"
 
 typedef struct {
     const char *cmd;     // module word, "testItem" and mostly the operation word

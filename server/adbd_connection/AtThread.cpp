@@ -1,15 +1,15 @@
 // The PC command channel thread.
-#include "AtThread.h"
+#include "adbd_connection/AtThread.h"
 
 #include <pthread.h>
 #include <unistd.h>
 
 #include <android/log.h>
 
-#include "AtCmdTable.h"
-#include "CmdParse.h"
+#include "adbd_connection/AtCmdTable.h"
+#include "adbd_connection/CmdParse.h"
 #include "devfs.h"
-#include "ftx_lib_binding.h"
+#include "core/ftx_lib_binding.h"
 #include "minigui/minigui.h"
 #include "minigui/window.h"
 #include "tp_os.h"

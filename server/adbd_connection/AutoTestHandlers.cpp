@@ -1,6 +1,6 @@
 // Handlers that need nothing but the result record, the core-device library and the
 // device shell.
-#include "AutoTestHandlers.h"
+#include "adbd_connection/AutoTestHandlers.h"
 
 #include <ctype.h>
 #include <stdio.h>
@@ -8,11 +8,11 @@
 
 #include <android/log.h>
 
-#include "mmi_loglevel.h"
+#include "core/mmi_loglevel.h"
 
 #include "devfs.h"
-#include "ftx_lib_binding.h"
-#include "mmi_testinfo.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_testinfo.h"
 
 namespace {
 

@@ -1,7 +1,7 @@
 // Handlers of the PC commands (signature AtCmdFun; bit 0 of the answer is success).
 #pragma once
 
-#include "CmdParse.h"
+#include "adbd_connection/CmdParse.h"
 
 // Result record: "<item>,read" or "<item>,<result>,write".
 int AutoTest_testinfo(const char *parm, int parmLen, char *reply, unsigned int replySize);

@@ -1,5 +1,5 @@
 // Registry and parser of the PC commands.
-#include "CmdParse.h"
+#include "adbd_connection/CmdParse.h"
 
 #include <stdint.h>
 #include <stdlib.h>
@@ -7,7 +7,7 @@
 
 #include <android/log.h>
 
-#include "mmi_loglevel.h"
+#include "core/mmi_loglevel.h"
 
 namespace {
 

@@ -1,13 +1,13 @@
 // Handlers that start and stop the vibrator, read the handset's identity and battery, and
 // switch standby, the MMI subset, the configuration and the power.
-#include "autotest_handlers_device.h"
+#include "adbd_connection/autotest_handlers_device.h"
 
 #include <android/log.h>
 
-#include "mmi_autotest.h"
-#include "mmi_identity.h"
-#include "mmi_power.h"
-#include "mmi_testwnd.h"
+#include "session/mmi_autotest.h"
+#include "screens/mmi_identity.h"
+#include "core/mmi_power.h"
+#include "testwnd/mmi_testwnd.h"
 
 #define HD_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "AtThread", __VA_ARGS__)
 

@@ -2,7 +2,7 @@
 // switch, the configuration write and power (signature AtCmdFun; bit 0 is success).
 #pragma once
 
-#include "CmdParse.h"
+#include "adbd_connection/CmdParse.h"
 
 #define DEVICE_HANDLER(name) \
     int name(const char *parm, int parmLen, char *reply, unsigned int replySize);

@@ -3,7 +3,7 @@
 
 #include <memory>
 
-#include "ftx_config.h"
+#include "core/ftx_config.h"
 #include "tests/fuzz/config/fuzz_common.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, size_t size) {

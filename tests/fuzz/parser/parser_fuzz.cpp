@@ -11,11 +11,11 @@
 #include <string>
 #include <utility>
 
-#include "AtCmdTable.h"
-#include "AutoTestHandlers.h"
-#include "CmdParse.h"
-#include "ftx_lib_binding.h"
-#include "mmi_testinfo.h"
+#include "adbd_connection/AtCmdTable.h"
+#include "adbd_connection/AutoTestHandlers.h"
+#include "adbd_connection/CmdParse.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_testinfo.h"
 
 namespace {
 

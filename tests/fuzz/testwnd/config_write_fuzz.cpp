@@ -8,8 +8,8 @@
 #include <algorithm>
 #include <string>
 
-#include "ftx_config.h"
-#include "mmi_autotest_config.h"
+#include "core/ftx_config.h"
+#include "core/mmi_autotest_config.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, size_t size) {
     std::string input(reinterpret_cast<const char *>(data), size);

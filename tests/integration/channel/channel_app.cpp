@@ -3,8 +3,8 @@
 #include <stdio.h>
 #include <unistd.h>
 
-#include "AtThread.h"
-#include "ftx_lib_binding.h"
+#include "adbd_connection/AtThread.h"
+#include "core/ftx_lib_binding.h"
 
 int main() {
     if (ftx_init_lib_factory_dll() != 0 || ftx_init_libdvk_ncoredevice_dll() != 0) {

@@ -12,7 +12,7 @@
 
 #include <gtest/gtest.h>
 
-#include "AtCmdTable.h"
+#include "adbd_connection/AtCmdTable.h"
 #include "pc_client.h"
 #include "support/temp_root.h"
 

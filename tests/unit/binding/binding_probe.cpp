@@ -4,10 +4,10 @@
 #include <stdio.h>
 #include <string.h>
 
-#include "AtThread.h"
+#include "adbd_connection/AtThread.h"
 #include "ftx_host.h"
-#include "ftx_lib_binding.h"
-#include "mmi_testinfo.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_testinfo.h"
 
 namespace {
 

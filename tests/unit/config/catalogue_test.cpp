@@ -6,8 +6,8 @@
 
 #include <gtest/gtest.h>
 
-#include "mmi_testitem.h"
-#include "mmi_testitem_entries.h"
+#include "session/mmi_testitem.h"
+#include "testwnd/mmi_testitem_entries.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -10,9 +10,9 @@
 
 #include <gtest/gtest.h>
 
-#include "ftx_config.h"
-#include "mmi_settings.h"
-#include "mmi_testitem.h"
+#include "core/ftx_config.h"
+#include "core/mmi_settings.h"
+#include "session/mmi_testitem.h"
 #include "support/temp_root.h"
 #include "tp_os.h"
 

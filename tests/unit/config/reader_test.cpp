@@ -5,7 +5,7 @@
 
 #include <gtest/gtest.h>
 
-#include "ftx_config.h"
+#include "core/ftx_config.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

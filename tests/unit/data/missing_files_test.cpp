@@ -4,8 +4,8 @@
 
 #include <gtest/gtest.h>
 
-#include "ftx_config.h"
-#include "mmi_settings.h"
+#include "core/ftx_config.h"
+#include "core/mmi_settings.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -9,7 +9,7 @@
 #include <gtest/gtest.h>
 
 #include "ftx_log.h"
-#include "mmi_settings.h"
+#include "core/mmi_settings.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -1,7 +1,7 @@
 // Geometry, fonts and the power key's threshold of the main window, from the screen size.
 #include <gtest/gtest.h>
 
-#include "mmi_mainwnd.h"
+#include "hub/mmi_mainwnd.h"
 
 namespace {
 

@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "mmi_power.h"
-#include "mmi_settings.h"
+#include "core/mmi_power.h"
+#include "core/mmi_settings.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -11,8 +11,8 @@
 
 #include <gtest/gtest.h>
 
-#include "AtCmdTable.h"
-#include "CmdParse.h"
+#include "adbd_connection/AtCmdTable.h"
+#include "adbd_connection/CmdParse.h"
 #include "support/temp_root.h"
 
 namespace {

@@ -7,9 +7,9 @@
 
 #include <gtest/gtest.h>
 
-#include "AtCmdTable.h"
-#include "CmdParse.h"
-#include "ftx_lib_binding.h"
+#include "adbd_connection/AtCmdTable.h"
+#include "adbd_connection/CmdParse.h"
+#include "core/ftx_lib_binding.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -8,8 +8,8 @@
 
 #include <gtest/gtest.h>
 
-#include "AtCmdTable.h"
-#include "CmdParse.h"
+#include "adbd_connection/AtCmdTable.h"
+#include "adbd_connection/CmdParse.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -5,7 +5,7 @@
 
 #include <filesystem>
 
-#include "AtThread.h"
+#include "adbd_connection/AtThread.h"
 #include "unit/gui/gui_harness.h"
 
 using namespace guitest;

@@ -10,10 +10,10 @@
 
 #include <gtest/gtest.h>
 
-#include "ftx_lib_binding.h"
-#include "mmi_runstate.h"
-#include "mmi_settings.h"
-#include "mmi_testinfo.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_runstate.h"
+#include "core/mmi_settings.h"
+#include "session/mmi_testinfo.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

@@ -8,11 +8,11 @@
 
 #include <gtest/gtest.h>
 
-#include "mmi_autotest.h"
-#include "mmi_monomer.h"
-#include "mmi_runstate.h"
-#include "mmi_settings.h"
-#include "mmi_testwnd.h"
+#include "session/mmi_autotest.h"
+#include "session/mmi_monomer.h"
+#include "session/mmi_runstate.h"
+#include "core/mmi_settings.h"
+#include "testwnd/mmi_testwnd.h"
 #include "support/temp_root.h"
 
 namespace {

@@ -6,9 +6,9 @@
 
 #include <gtest/gtest.h>
 
-#include "ftx_config.h"
-#include "mmi_autotest.h"
-#include "mmi_autotest_config.h"
+#include "core/ftx_config.h"
+#include "session/mmi_autotest.h"
+#include "core/mmi_autotest_config.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 

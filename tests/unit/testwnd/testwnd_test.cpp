@@ -12,14 +12,14 @@
 
 #include <gtest/gtest.h>
 
-#include "autotest_handlers_device.h"
+#include "adbd_connection/autotest_handlers_device.h"
 #include "ftx_host.h"
-#include "ftx_lib_binding.h"
-#include "mmi_devicetest.h"
-#include "mmi_identity.h"
-#include "mmi_infoscreen.h"
-#include "mmi_testinfo.h"
-#include "mmi_testwnd.h"
+#include "core/ftx_lib_binding.h"
+#include "screens/mmi_devicetest.h"
+#include "screens/mmi_identity.h"
+#include "screens/mmi_infoscreen.h"
+#include "session/mmi_testinfo.h"
+#include "testwnd/mmi_testwnd.h"
 
 namespace {
 

@@ -6,9 +6,9 @@
 #include <atomic>
 
 // Menu rows and dialog actions; the result is not used.
-#include "mmi_devicetest.h"
-#include "mmi_infoscreen.h"
-#include "mmi_monomer.h"
+#include "screens/mmi_devicetest.h"
+#include "screens/mmi_infoscreen.h"
+#include "session/mmi_monomer.h"
 int mmi_testwnd_Coupling_Entry(void);
 int mmi_AgingTestEntry(void);
 int mmi_AgingTest_Start_Entry(void);

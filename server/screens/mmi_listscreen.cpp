@@ -1,16 +1,16 @@
 // The shared list screen.
-#include "mmi_listscreen.h"
+#include "screens/mmi_listscreen.h"
 
 #include <string.h>
 
 #include <android/log.h>
 
-#include "ftx_config.h"
+#include "core/ftx_config.h"
 #include "mmi_bars.h"
 #include "mmi_guithread.h"
-#include "mmi_mainwnd.h"
-#include "mmi_settings.h"
-#include "mmi_testwnd.h"
+#include "hub/mmi_mainwnd.h"
+#include "core/mmi_settings.h"
+#include "testwnd/mmi_testwnd.h"
 #include "tp_os.h"
 
 namespace {

@@ -1,7 +1,7 @@
 // The result table: one record per item with its label. Chinese labels are GBK bytes
 // (their characters in the comments); rows 339, 358 and 359 carry copied index numbers,
 // as the station tools expect.
-#include "mmi_testinfo.h"
+#include "session/mmi_testinfo.h"
 
 mmi_testinfo_t g_testinfo[MMI_TESTINFO_ITEMS] = {
     {0, 0, "S_BOARDTEST_CURRENT"},

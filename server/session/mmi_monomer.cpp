@@ -1,10 +1,10 @@
 // The monomer preview sequence.
-#include "mmi_monomer.h"
+#include "session/mmi_monomer.h"
 
 #include <android/log.h>
 
-#include "mmi_autotest.h"
-#include "mmi_testitem.h"
+#include "session/mmi_autotest.h"
+#include "session/mmi_testitem.h"
 
 #define MP_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_MAIN", __VA_ARGS__)
 

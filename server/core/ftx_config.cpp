@@ -1,5 +1,5 @@
 // Reader of the sectioned configuration format and of parameter strings.
-#include "ftx_config.h"
+#include "core/ftx_config.h"
 
 #include <string.h>
 

@@ -1,5 +1,5 @@
 // The test and product information screen.
-#include "mmi_infoscreen.h"
+#include "screens/mmi_infoscreen.h"
 
 #include <string.h>
 
@@ -7,11 +7,11 @@
 
 #include <android/log.h>
 
-#include "ftx_config.h"
-#include "ftx_lib_binding.h"
-#include "mmi_identity.h"
-#include "mmi_listscreen.h"
-#include "mmi_testinfo.h"
+#include "core/ftx_config.h"
+#include "core/ftx_lib_binding.h"
+#include "screens/mmi_identity.h"
+#include "screens/mmi_listscreen.h"
+#include "session/mmi_testinfo.h"
 #include "tp_os.h"
 
 #define INFO_TAG "FTX_MAIN"

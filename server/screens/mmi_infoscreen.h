@@ -2,7 +2,7 @@
 // numbers, IMEI, flash type, then every item of the result record that passed or failed.
 #pragma once
 
-#include "mmi_hub_links.h"
+#include "hub/mmi_hub_links.h"
 
 #include "mmi_msg.h"
 

@@ -2,10 +2,10 @@
 // configured item with its result in colour. MSG_TIMER with wParam 1 refreshes it.
 #pragma once
 
-#include "mmi_hub_links.h"
+#include "hub/mmi_hub_links.h"
 
 #include "mmi_msg.h"
-#include "mmi_testitem.h"
+#include "session/mmi_testitem.h"
 
 #define MMI_DEVICETEST_TIMER_REFRESH 1
 

@@ -1,5 +1,5 @@
 // mmi_initconfig: the catalogue, the language texts and the process-wide settings.
-#include "mmi_settings.h"
+#include "core/mmi_settings.h"
 
 #include <stdio.h>
 #include <stdlib.h>
@@ -9,8 +9,8 @@
 #include <android/log.h>
 
 #include "devfs.h"
-#include "ftx_config.h"
-#include "mmi_testitem.h"
+#include "core/ftx_config.h"
+#include "session/mmi_testitem.h"
 #include "tp_os.h"
 
 #define CFG_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_CONFIG", __VA_ARGS__)

@@ -1,5 +1,5 @@
 // Identity and state readers for the PC and the information screen.
-#include "mmi_identity.h"
+#include "screens/mmi_identity.h"
 
 #include <stdio.h>
 #include <stdlib.h>
@@ -11,11 +11,11 @@
 #include <android/log.h>
 
 #include "devfs.h"
-#include "ftx_lib_binding.h"
-#include "mmi_autotest.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_autotest.h"
 #include "mmi_msg.h"
-#include "mmi_power.h"
-#include "mmi_settings.h"
+#include "core/mmi_power.h"
+#include "core/mmi_settings.h"
 #include "tp_os.h"
 
 #define ID_TAG "AtThread"

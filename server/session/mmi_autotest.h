@@ -4,7 +4,7 @@
 
 #include <atomic>
 
-#include "mmi_testitem.h"
+#include "session/mmi_testitem.h"
 
 // g_autoTestMode values.
 #define AUTOTEST_MODE_FULL 0

@@ -1,5 +1,5 @@
 // The device-test list window.
-#include "mmi_devicetest.h"
+#include "screens/mmi_devicetest.h"
 
 #include <string.h>
 
@@ -7,14 +7,14 @@
 
 #include <android/log.h>
 
-#include "ftx_lib_binding.h"
-#include "mmi_autotest.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_autotest.h"
 #include "mmi_guithread.h"
-#include "mmi_infoscreen.h"
-#include "mmi_listscreen.h"
-#include "mmi_runstate.h"
-#include "mmi_testinfo.h"
-#include "mmi_testwnd.h"
+#include "screens/mmi_infoscreen.h"
+#include "screens/mmi_listscreen.h"
+#include "session/mmi_runstate.h"
+#include "session/mmi_testinfo.h"
+#include "testwnd/mmi_testwnd.h"
 #include "tp_os.h"
 
 #define DT_TAG "FTX_MAIN"

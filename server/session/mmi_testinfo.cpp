@@ -1,6 +1,6 @@
 // The pass/fail record: packing, the single-item write with its read-back and roll-up,
 // and the PC read and write back ends.
-#include "mmi_testinfo.h"
+#include "session/mmi_testinfo.h"
 
 #include <stdio.h>
 #include <stdlib.h>
@@ -10,12 +10,12 @@
 
 #include <android/log.h>
 
-#include "mmi_loglevel.h"
+#include "core/mmi_loglevel.h"
 
 #include "devfs.h"
-#include "ftx_lib_binding.h"
-#include "mmi_runstate.h"
-#include "mmi_settings.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_runstate.h"
+#include "core/mmi_settings.h"
 
 namespace {
 

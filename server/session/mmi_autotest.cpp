@@ -1,5 +1,5 @@
 // The automatic test sequence and its restore files.
-#include "mmi_autotest.h"
+#include "session/mmi_autotest.h"
 
 #include <stdio.h>
 #include <stdlib.h>
@@ -9,12 +9,12 @@
 #include <android/log.h>
 
 #include "devfs.h"
-#include "ftx_config.h"
-#include "ftx_lib_binding.h"
-#include "mmi_devicetest.h"
-#include "mmi_runstate.h"
-#include "mmi_settings.h"
-#include "mmi_testinfo.h"
+#include "core/ftx_config.h"
+#include "core/ftx_lib_binding.h"
+#include "screens/mmi_devicetest.h"
+#include "session/mmi_runstate.h"
+#include "core/mmi_settings.h"
+#include "session/mmi_testinfo.h"
 #include "tp_os.h"
 
 #define AT_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_AUTOTEST", __VA_ARGS__)

@@ -1,3 +1,3 @@
-#include "mmi_runstate.h"
+#include "session/mmi_runstate.h"
 
 std::atomic<int> g_bAutoTestRunning{0};

@@ -1,5 +1,5 @@
 // The test-window framework and the table of tests that follow its pattern.
-#include "mmi_testwnd.h"
+#include "testwnd/mmi_testwnd.h"
 
 #include <errno.h>
 #include <signal.h>
@@ -11,15 +11,15 @@
 
 #include <android/log.h>
 
-#include "ftx_config.h"
-#include "mmi_autotest.h"
+#include "core/ftx_config.h"
+#include "session/mmi_autotest.h"
 #include "mmi_bars.h"
 #include "minigui/control.h"
 #include "mmi_guithread.h"
-#include "mmi_mainwnd.h"
-#include "mmi_monomer.h"
-#include "mmi_runstate.h"
-#include "mmi_testinfo.h"
+#include "hub/mmi_mainwnd.h"
+#include "session/mmi_monomer.h"
+#include "session/mmi_runstate.h"
+#include "session/mmi_testinfo.h"
 #include "tp_os.h"
 
 #define TW_DEBUG(tag, ...) __android_log_print(ANDROID_LOG_DEBUG, tag, __VA_ARGS__)

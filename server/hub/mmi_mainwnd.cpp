@@ -1,6 +1,6 @@
 // The hub window and its procedure, the key hook with the power and link keys, the
 // dialogs of the other parts and the title strip's shared setter.
-#include "mmi_mainwnd.h"
+#include "hub/mmi_mainwnd.h"
 
 #include <android/log.h>
 #include <cutils/properties.h>
@@ -18,18 +18,18 @@
 #include <semaphore>
 #include <string>
 
-#include "ftx_config.h"
-#include "ftx_lib_binding.h"
-#include "mmi_autotest.h"
+#include "core/ftx_config.h"
+#include "core/ftx_lib_binding.h"
+#include "session/mmi_autotest.h"
 #include "mmi_bars.h"
 #include "mmi_dialog.h"
 #include "mmi_guithread.h"
-#include "AtThread.h"
-#include "mmi_hub_links.h"
+#include "adbd_connection/AtThread.h"
+#include "hub/mmi_hub_links.h"
 #include "mmi_menulist.h"
-#include "mmi_power.h"
-#include "mmi_settings.h"
-#include "mmi_testitem.h"
+#include "core/mmi_power.h"
+#include "core/mmi_settings.h"
+#include "session/mmi_testitem.h"
 
 // Registered for "TPHARDWARE" when the touch-panel alert is confirmed in state 3.
 void Get_tpstatus_callback(module_data *data);

@@ -10,9 +10,9 @@
 #include <android/log.h>
 
 #include "devfs.h"
-#include "ftx_config.h"
-#include "mmi_autotest.h"
-#include "mmi_autotest_config.h"
+#include "core/ftx_config.h"
+#include "session/mmi_autotest.h"
+#include "core/mmi_autotest_config.h"
 #include "tp_os.h"
 
 #define CW_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_CONFIG", __VA_ARGS__)

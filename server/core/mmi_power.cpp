@@ -1,7 +1,7 @@
 // Screen sleep after the idle time, automatic power-off and the battery warnings. Driven
 // by the battery service's observer calls on its own thread; the power key and the PC's
 // standby commands come in from the GUI and command threads.
-#include "mmi_power.h"
+#include "core/mmi_power.h"
 
 #include <android/log.h>
 #include <devfs.h>
@@ -14,8 +14,8 @@
 
 #include <mutex>
 
-#include "ftx_config.h"
-#include "mmi_settings.h"
+#include "core/ftx_config.h"
+#include "core/mmi_settings.h"
 
 #define TAG "batteryObserver"
 #define LOGD(...) __android_log_print(ANDROID_LOG_DEBUG, TAG, __VA_ARGS__)

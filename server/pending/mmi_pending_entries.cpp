@@ -3,7 +3,7 @@
 // its lines here; this file only shrinks.
 #include <android/log.h>
 
-#include "mmi_testitem_entries.h"
+#include "testwnd/mmi_testitem_entries.h"
 
 #define PENDING_ENTRY(fn, tag)                                                          \
     void *fn(void) {                                                                    \

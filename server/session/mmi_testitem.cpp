@@ -1,13 +1,13 @@
 // The compiled-in test item catalogue and the lists built from it and the configuration.
-#include "mmi_testitem.h"
+#include "session/mmi_testitem.h"
 
 #include <stdlib.h>
 #include <string.h>
 
 #include <android/log.h>
 
-#include "ftx_config.h"
-#include "mmi_testitem_entries.h"
+#include "core/ftx_config.h"
+#include "testwnd/mmi_testitem_entries.h"
 #include "tp_os.h"
 
 #define CFG_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_CONFIG", __VA_ARGS__)

@@ -2,7 +2,7 @@
 // another. Nothing is recorded: the run only shows each screen in turn.
 #pragma once
 
-#include "mmi_hub_links.h"
+#include "hub/mmi_hub_links.h"
 
 #include <atomic>
 

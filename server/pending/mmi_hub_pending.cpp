@@ -4,7 +4,7 @@
 #include <android/log.h>
 #include <errno.h>
 
-#include "mmi_hub_links.h"
+#include "hub/mmi_hub_links.h"
 
 #define PENDING(ret, fn, args, value, tag)                                         \
     __attribute__((weak)) ret fn args {                                            \

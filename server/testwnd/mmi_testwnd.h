@@ -9,7 +9,7 @@
 #include <atomic>
 #include <mutex>
 
-#include "ftx_lib_binding.h"
+#include "core/ftx_lib_binding.h"
 #include "mmi_msg.h"
 
 #define MMI_TESTWND_TEXT_SIZE 256

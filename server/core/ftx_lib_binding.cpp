@@ -1,12 +1,12 @@
 // Binding of the handset libraries by name: one table per binder, one loop for all.
-#include "ftx_lib_binding.h"
+#include "core/ftx_lib_binding.h"
 
 #include <dlfcn.h>
 #include <string.h>
 
 #include <android/log.h>
 
-#include "mmi_testinfo.h"
+#include "session/mmi_testinfo.h"
 
 namespace hw {
 #define FTX_HW_DEFINE_OP(name) ftx_hw_op<decltype(&::name)> name;
