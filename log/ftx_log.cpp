@@ -13,7 +13,7 @@
 #include <android/log.h>
 
 #include "devfs.h"
-#include "mmi_settings.h"
+#include "core/mmi_settings.h"
 #include "tp_os.h"
 
 #define LOG_TAG "FTXLOG"
