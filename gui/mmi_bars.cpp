@@ -11,6 +11,7 @@
 #include <atomic>
 
 #include "mmi_iconlet.h"
+#include "mmi_theme.h"
 
 namespace {
 
@@ -188,7 +189,7 @@ void *bar_thread(void *arg) {
     create.ty = b.rect.top;
     create.rx = b.rect.right;
     create.by = b.rect.bottom;
-    create.iBkColor = SysPixelIndex[17];
+    create.iBkColor = mmi_pixel(MMI_COLOUR_BAR);
     HWND win = CreateMainWindow(&create);
     if (win == HWND_INVALID) {
         unlock(b);
@@ -202,7 +203,7 @@ void *bar_thread(void *arg) {
             b.font = CreateLogFont("ttf", "song", "GB18030", 'r', 'r', 'n', 'c', 'n', 'n',
                                    w < 1725 ? (int)((w * 458129845LL) >> 33) & ~3 : 90, 0);
         if (b.font) SetWindowFont(ctrl, b.font);
-        SetWindowBkColor(ctrl, SysPixelIndex[17]);
+        SetWindowBkColor(ctrl, mmi_pixel(MMI_COLOUR_BAR));
         SendMessage(ctrl, ILM_SETALIGN, ICONLET_ALIGN_CENTER, 0);
         b.window = win;
         b.control = ctrl;

@@ -10,6 +10,8 @@
 #include <mutex>
 #include <set>
 
+#include "mmi_theme.h"
+
 #define TAG "MMI_DIALOG"
 #define LOGD(...) __android_log_print(ANDROID_LOG_DEBUG, TAG, __VA_ARGS__)
 
@@ -17,9 +19,6 @@ int g_bKeyValid = 0;
 
 namespace {
 
-const int kBackground = 7;  // system pixel indexes
-const int kControl = 21;
-const int kHighlight = 22;
 
 // Records alive, and the latest one; hooks and CloseButton run off the GUI thread.
 std::mutex s_lock;
@@ -41,15 +40,15 @@ PLOGFONT make_font(char weight) {
 
 void set_button_colour(MMI_DIALOG *dlg, int i, int colour) {
     if (i < 0 || i >= dlg->buttonCount || dlg->buttons[i] == HWND_INVALID) return;
-    SetWindowBkColor(dlg->buttons[i], SysPixelIndex[colour]);
+    SetWindowBkColor(dlg->buttons[i], mmi_pixel(colour));
     InvalidateRect(dlg->buttons[i], nullptr, TRUE);
 }
 
 void select_button(MMI_DIALOG *dlg, int i, bool highlight) {
     if (i >= dlg->buttonCount) return;
-    if (dlg->selected >= 0 && dlg->selected != i) set_button_colour(dlg, dlg->selected, kControl);
+    if (dlg->selected >= 0 && dlg->selected != i) set_button_colour(dlg, dlg->selected, MMI_COLOUR_CONTROL);
     dlg->selected = i;
-    if (highlight) set_button_colour(dlg, i, kHighlight);
+    if (highlight) set_button_colour(dlg, i, MMI_COLOUR_HILIGHT);
 }
 
 // Puts back the hooks (s_lock held) that were in force before DoModal. The library does not hand
@@ -114,7 +113,7 @@ LRESULT DialogProc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
         case MSG_MOUSEMOVE:
             if (dlg->selected >= 0 && mmi_dialog_button_at(&dlg->layout, LOSWORD(lParam),
                                                            HISWORD(lParam)) != dlg->selected) {
-                set_button_colour(dlg, dlg->selected, kControl);
+                set_button_colour(dlg, dlg->selected, MMI_COLOUR_CONTROL);
                 dlg->selected = -1;
             }
             return 0;
@@ -143,7 +142,7 @@ LRESULT DialogProc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             HDC hdc = BeginPaint(hWnd);
             const MMI_DIALOG_LAYOUT &l = dlg->layout;
             int w = RECTW(l.dialog);
-            SetPenColor(hdc, SysPixelIndex[kBackground]);
+            SetPenColor(hdc, mmi_pixel(MMI_COLOUR_GRAY));
             if (l.count > 0) {
                 MoveTo(hdc, 0, l.buttons.top);
                 LineTo(hdc, w, l.buttons.top);
@@ -152,7 +151,7 @@ LRESULT DialogProc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
                 MoveTo(hdc, i * l.buttonWidth - 1, l.buttons.top);
                 LineTo(hdc, i * l.buttonWidth - 1, l.buttons.bottom);
             }
-            SetPenColor(hdc, SysPixelIndex[kHighlight]);
+            SetPenColor(hdc, mmi_pixel(MMI_COLOUR_HILIGHT));
             for (int row = l.title.bottom; row < l.title.bottom + dlg->separator; row++) {
                 MoveTo(hdc, 0, row);
                 LineTo(hdc, w, row);
@@ -170,7 +169,7 @@ HWND make_static(MMI_DIALOG *dlg, const char *text, DWORD style, LINT id, const 
     HWND h = CreateWindowEx(CTRL_STATIC, text, style, WS_EX_NONE, id, rc.left, rc.top, RECTW(rc),
                             RECTH(rc), dlg->window, 0);
     if (h == HWND_INVALID) return h;
-    SetWindowBkColor(h, SysPixelIndex[kControl]);
+    SetWindowBkColor(h, mmi_pixel(MMI_COLOUR_CONTROL));
     if (font) SetWindowFont(h, font);
     return h;
 }
@@ -241,7 +240,7 @@ HDIALOG CreateDialog(const char *title, const char *text, int x, int y, int w, i
     create.ty = y;
     create.rx = x + w;
     create.by = y + h;
-    create.iBkColor = SysPixelIndex[kBackground];
+    create.iBkColor = mmi_pixel(MMI_COLOUR_GRAY);
     create.dwAddData = (DWORD)dlg;
     dlg->window = CreateMainWindow(&create);
     if (dlg->window == HWND_INVALID) {

@@ -6,6 +6,8 @@
 #include <algorithm>
 #include <vector>
 
+#include "mmi_theme.h"
+
 namespace {
 
 const ICONLET_SKIN kDefaultSkin = {22, -1};
@@ -129,7 +131,7 @@ void paint(HWND h, IconLet *d) {
     GetClientRect(h, &rc);
     SetBkMode(hdc, BM_TRANSPARENT);
     int colour = d->skin.textColour >= 0 ? d->skin.textColour : d->textColour;
-    SetTextColor(hdc, SysPixelIndex[colour]);
+    SetTextColor(hdc, mmi_pixel(colour));
     UINT fmt = DT_SINGLELINE | DT_VCENTER | DT_NOPREFIX;
     if (d->align == ICONLET_ALIGN_CENTER) fmt |= DT_CENTER;
     if (d->align == ICONLET_ALIGN_RIGHT) fmt |= DT_RIGHT;
@@ -137,7 +139,7 @@ void paint(HWND h, IconLet *d) {
     for (size_t i = 0; i < d->items.size(); i++) {
         const ICONLET_ITEM &it = d->items[i];
         if (it.slot == d->pressed) {
-            SetBrushColor(hdc, SysPixelIndex[d->skin.pressedBkColour]);
+            SetBrushColor(hdc, mmi_pixel(d->skin.pressedBkColour));
             FillBox(hdc, it.x, 0, it.width, RECTH(rc));
         }
         // DrawText clips to the box.
@@ -231,7 +233,7 @@ BOOL RegisterIconLetCtrl(void) {
     cls.spClassName = CTRL_ICONLET;
     cls.dwStyle = WS_NONE;
     cls.dwExStyle = WS_EX_NONE;
-    cls.iBkColor = SysPixelIndex[17];
+    cls.iBkColor = mmi_pixel(MMI_COLOUR_BAR);
     cls.WinProc = IconLetProc;
     if (RegisterWindowClass(&cls)) return TRUE;
     // Already registered by an earlier call.

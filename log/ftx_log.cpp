@@ -13,7 +13,6 @@
 #include <android/log.h>
 
 #include "devfs.h"
-#include "core/mmi_settings.h"
 #include "tp_os.h"
 
 #define LOG_TAG "FTXLOG"
@@ -156,8 +155,8 @@ int init_ftx_log(FILE **stream_out, const char *directory, const char *file_name
     return 0;
 }
 
-int ftx_initlog(void) {
-    if (init_ftx_log(&s_logFp, g_chLogPath, "ftx.log") != 0) {
+int ftx_initlog(const char *directory) {
+    if (init_ftx_log(&s_logFp, directory, "ftx.log") != 0) {
         LOG_ERROR("%s:L%d:init_ftx_log(ftx.log) fail.", __func__, 357);
         return -1;
     }

@@ -1,4 +1,4 @@
-// Plain-text event logs on the device (the main one is ftx.log in g_chLogPath). One mutex
+// Plain-text event logs on the device (the main one is ftx.log in the log folder). One mutex
 // serialises every open, write and close; each entry is flushed and synced before return.
 #pragma once
 
@@ -12,8 +12,8 @@ extern FILE *s_logFp;
 // Opens directory/file_name for appending, creating the directory path. Stores the stream
 // or null through stream_out; 0 or -1.
 int init_ftx_log(FILE **stream_out, const char *directory, const char *file_name);
-// Opens the main log ftx.log in g_chLogPath; 0 or -1.
-int ftx_initlog(void);
+// Opens the main log ftx.log in directory (the configured log folder); 0 or -1.
+int ftx_initlog(const char *directory);
 // "MM/DD-HH:MM:SS [label] message"; 0, or -1 on a null stream.
 int writeftxlog(FILE *stream, const char *label, const char *format, ...)
     __attribute__((format(printf, 3, 4)));

@@ -15,6 +15,8 @@
 #include "core/mmi_autotest_config.h"
 #include "mmi_iconlet.h"
 #include "hub/mmi_mainwnd.h"
+#include "mmi_startup.h"
+#include "core/mmi_power.h"
 #include "core/mmi_settings.h"
 
 #define TAG "DVK_FTX"
@@ -23,6 +25,7 @@
 
 int main(int argc, char **argv) {
     tp_os_thread_init(argc, argv);
+    mmi_startup_wire();
     LOGD("%s begin", "main");
     if (ftx_init_lib_factory_dll() != 0) {
         LOGE("ftx_init_lib_factory_dll fail! %s", "main");
@@ -56,7 +59,7 @@ int main(int argc, char **argv) {
     memset(bootmode, 0, sizeof bootmode);
     property_get("ro.bootmode", bootmode, "normal");
     if (strncmp(bootmode, "ffbm-99", 7) != 0) {
-        ftx_initlog();
+        ftx_initlog(g_chLogPath);
         kmt_CreateMainMenuWnd();
         tp_os_sema_get(0, TP_OS_WAIT_FOREVER);
         return 0;

@@ -1,15 +1,16 @@
-// Start-up helpers shared with the aging test, the power-off entry, and the wiring of
-// power management to the bound library.
-#include <android/log.h>
-#include <devfs.h>
-#include <stdio.h>
-#include <tp_os.h>
-#include <unistd.h>
+// Start-up wiring of the layers, and of power management to the bound library.
+#include "mmi_startup.h"
 
 #include "core/ftx_lib_binding.h"
-#include "hub/mmi_mainwnd.h"
 #include "core/mmi_power.h"
 #include "core/mmi_settings.h"
+#include "hub/mmi_mainwnd.h"
+#include "screens/mmi_devicetest.h"
+#include "session/mmi_autotest.h"
+#include "session/mmi_monomer.h"
+#include "session/mmi_testinfo.h"
+#include "session/mmi_testitem.h"
+#include "testwnd/catalogue.h"
 
 namespace {
 
@@ -31,20 +32,15 @@ int bound_unregister(int kind, FTX_BatteryObserver_cb cb) {
 
 }  // namespace
 
-int Check_AgingCfg_Exist(void) {
-    // Joined into 256 bytes: a longer path is cut at 255 characters.
-    char path[256];
-    size_t n = tp_os_strlcpy(path, g_chLogPath, sizeof path);
-    tp_os_strlcpy(path + n, "rebootAging.txt", sizeof path - n);
-    return dev_access(path, R_OK) == 0 ? 1 : 0;
-}
-
-int mmi_PowerOffEntry(void) {
-    __android_log_print(ANDROID_LOG_DEBUG, "FTX_MAIN", "%s begin", "mmi_PowerOffEntry");
-    if (hw::ftx_api_ftx_mode_uninit) hw::ftx_api_ftx_mode_uninit();
-    dev_sync();
-    dev_reboot(LINUX_REBOOT_CMD_POWER_OFF);
-    return 1;
+void mmi_startup_wire(void) {
+    mmi_testitem_use_catalogue(mmi_catalogue_tables());
+    mmi_initconfig_set_list_builder(mmi_build_test_lists);
+    mmi_testinfo_hand_binding_fallbacks();
+    mmi_autotest_install_run();
+    mmi_monomer_install_run();
+    g_autotestOps.open_device_list = mmi_DeviceTestEntry;
+    g_autotestOps.device_list_is_open = mmi_DeviceTest_IsOpen;
+    g_autotestOps.refresh_device_list = mmi_DeviceTest_Refresh;
 }
 
 void mmi_power_use_bound_library(void) {

@@ -6,7 +6,6 @@
 
 #include <android/log.h>
 
-#include "session/mmi_testinfo.h"
 
 namespace hw {
 #define FTX_HW_DEFINE_OP(name) ftx_hw_op<decltype(&::name)> name;
@@ -35,6 +34,9 @@ const char kCoreLib[] = "libdvk_ncoredevice.so";
 const char kCoreLabel[] = "g_libcoredevice.so";
 const char kStartTag[] = "DVK_FTX";
 
+ftx_hw_slot s_handedReadFlags;
+ftx_hw_slot s_handedWriteFlags;
+
 template <typename F>
 void *fn_addr(F f) {
     return reinterpret_cast<void *>(f);
@@ -50,6 +52,8 @@ void *fn_addr(F f) {
     { #name, &hw::name, FTX_BIND_OPTIONAL, nullptr, shown }
 #define REQ_AS(name, shown) \
     { #name, &hw::name, FTX_BIND_REQUIRED, nullptr, shown }
+#define OPT_HANDED(name, slot) \
+    { #name, &hw::name, FTX_BIND_OPTIONAL, nullptr, nullptr, &slot }
 #define ANY(name) \
     { #name, &hw::name, FTX_BIND_SILENT, nullptr, nullptr }
 #define COUNT(rows) static_cast<int>(sizeof(rows) / sizeof(rows[0]))
@@ -62,8 +66,8 @@ const ftx_sym_binding kStartupSet[] = {
     OPT_FB(ftx_api_ftx_mode_uninit, &func_temp),
     REQ(ftx_api_Get_TestInfo),
     REQ(ftx_api_Get_TestInfo_Stop),
-    OPT_FB(ftx_api_ReadFuncTestInfoFlags, &mmi_ReadFuncTestInfoFlags),
-    OPT_FB(ftx_api_WriteFuncTestInfoFlags, &mmi_WriteFuncTestInfoFlags),
+    OPT_HANDED(ftx_api_ReadFuncTestInfoFlags, s_handedReadFlags),
+    OPT_HANDED(ftx_api_WriteFuncTestInfoFlags, s_handedWriteFlags),
     REQ(ftx_api_GetSoftVersion),
     REQ(ftx_api_GetHardVersion),
     REQ(ftx_api_GetPSN),
@@ -299,7 +303,8 @@ int ftx_bind_symbols(void *handle, const char *libLabel, const char *tag, const 
             r.slot->set(p);
             continue;
         }
-        r.slot->set(r.kind == FTX_BIND_OPTIONAL ? r.fallback : nullptr);
+        void *standBy = r.handed != nullptr ? r.handed->get() : r.fallback;
+        r.slot->set(r.kind == FTX_BIND_OPTIONAL ? standBy : nullptr);
         if (r.kind == FTX_BIND_SILENT || r.kind == FTX_BIND_IF_UNSET) {
             dlerror();
             continue;
@@ -310,6 +315,11 @@ int ftx_bind_symbols(void *handle, const char *libLabel, const char *tag, const 
         if (r.kind == FTX_BIND_REQUIRED) return -1;
     }
     return 0;
+}
+
+void ftx_binding_set_fallbacks(const ftx_binding_fallbacks *fallbacks) {
+    s_handedReadFlags.set(fallbacks ? fn_addr(fallbacks->readFuncTestInfoFlags) : nullptr);
+    s_handedWriteFlags.set(fallbacks ? fn_addr(fallbacks->writeFuncTestInfoFlags) : nullptr);
 }
 
 ftx_hw_slot *ftx_hw_find(const char *name) {

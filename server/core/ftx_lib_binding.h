@@ -205,7 +205,17 @@ struct ftx_sym_binding {
     int kind;               // ftx_bind_kind
     void *fallback;         // stand-by of an optional symbol, or null
     const char *shownName;  // name in the failure line when the program words it otherwise
+    // Where a stand-by handed in by a higher layer is kept (it wins over fallback), or null.
+    const ftx_hw_slot *handed = nullptr;
 };
+
+// Stand-bys of the optional result-flag operations: the application's own copies of the
+// flags, handed in by the result record before the factory library is bound.
+struct ftx_binding_fallbacks {
+    decltype(&::ftx_api_ReadFuncTestInfoFlags) readFuncTestInfoFlags;
+    decltype(&::ftx_api_WriteFuncTestInfoFlags) writeFuncTestInfoFlags;
+};
+void ftx_binding_set_fallbacks(const ftx_binding_fallbacks *fallbacks);
 
 // Looks the rows up in order in handle, logging failures under tag as
 // "FATAL ERROR: could not dlsym <libLabel>::<name>" and "error = <dlerror>,<binder>".

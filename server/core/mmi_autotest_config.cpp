@@ -3,6 +3,7 @@
 #include <stdio.h>
 #include <string.h>
 #include <sys/mount.h>
+#include <unistd.h>
 
 #include <mutex>
 #include <string>
@@ -11,7 +12,6 @@
 
 #include "devfs.h"
 #include "core/ftx_config.h"
-#include "session/mmi_autotest.h"
 #include "core/mmi_autotest_config.h"
 #include "tp_os.h"
 

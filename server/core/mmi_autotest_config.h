@@ -5,6 +5,11 @@
 
 #define MMI_CFG_NAME_SIZE 256
 
+// Rewrites one key of the main configuration: parm is "DOMAIN,key,value". 1 on success.
+int mmi_AutoTest_Modify_ConfigFile(const char *parm);
+// Makes the system partition (which holds /etc) writable. 0 on success.
+int remount_system_partition(void);
+
 // Splits "DOMAIN,key,value" into three 256-byte buffers; -1 when a part is missing, too
 // long, or would break the file's line structure.
 int mmi_config_split_parm(const char *parm, char *domain, char *key, char *value);

@@ -15,6 +15,7 @@
 #include <mutex>
 
 #include "core/ftx_config.h"
+#include "core/ftx_lib_binding.h"
 #include "core/mmi_settings.h"
 
 #define TAG "batteryObserver"
@@ -24,10 +25,6 @@
 std::atomic<int> g_bCurrentSleepStatus{0};
 std::atomic<long long> g_LastInputTime{0};
 
-// Provided by the main window (title strip); weak so the power rules link on their own.
-__attribute__((weak)) int TitleInfoShow(const char *, int, int) {
-    return 0;
-}
 
 namespace {
 
@@ -49,6 +46,11 @@ std::mutex s_warnMutex;
 bool s_warning[WARN_COUNT];      // under s_warnMutex
 int s_warnedLevel = 0;           // level the low-battery warning came at (under s_warnMutex)
 int s_shownWarning = WARN_NONE;  // under s_warnMutex
+
+// Until start-up hands in the title strip, warnings go nowhere.
+int no_title(const char *, int, int) {
+    return 0;
+}
 
 int shell_run(const char *cmd) {
     return dev_system(cmd);
@@ -157,7 +159,7 @@ mmi_power_ops mmi_power_default_ops(void) {
     ops.write_file = write_file;
     ops.shell = shell_run;
     ops.power_off = power_off_now;
-    ops.title_show = TitleInfoShow;
+    ops.title_show = no_title;
     return ops;
 }
 
@@ -377,4 +379,12 @@ void batteryVoltobserver_cb(const FTX_BATTERY_INFO *info) {
         g_powerOps.unregister_observer(FTX_BATTERY_OBSERVER_VOLTAGE, batteryVoltobserver_cb);
         LOGD("FTX_API_BatteryService_unregister_Observer batteryVoltobserver_cb end");
     }
+}
+
+int mmi_PowerOffEntry(void) {
+    __android_log_print(ANDROID_LOG_DEBUG, "FTX_MAIN", "%s begin", "mmi_PowerOffEntry");
+    if (hw::ftx_api_ftx_mode_uninit) hw::ftx_api_ftx_mode_uninit();
+    dev_sync();
+    dev_reboot(LINUX_REBOOT_CMD_POWER_OFF);
+    return 1;
 }

@@ -62,3 +62,6 @@ void batteryVoltobserver_cb(const FTX_BATTERY_INFO *info);
 int mmi_battery_snapshot(FTX_BATTERY_INFO *out);
 // 1 when the charger charges, or the battery is full while a charger is online.
 int mmi_battery_is_charging(const FTX_BATTERY_INFO *info);
+
+// The power-off dialog's first button: the device powers off.
+int mmi_PowerOffEntry(void);

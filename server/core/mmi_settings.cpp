@@ -1,4 +1,4 @@
-// mmi_initconfig: the catalogue, the language texts and the process-wide settings.
+// mmi_initconfig: the test lists, the language texts and the process-wide settings.
 #include "core/mmi_settings.h"
 
 #include <stdio.h>
@@ -10,7 +10,6 @@
 
 #include "devfs.h"
 #include "core/ftx_config.h"
-#include "session/mmi_testitem.h"
 #include "tp_os.h"
 
 #define CFG_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_CONFIG", __VA_ARGS__)
@@ -60,6 +59,8 @@ struct BatteryField {
     char *textTarget;  // the backlight path
     const char *line;
 };
+
+std::atomic<void (*)(void)> s_buildLists{nullptr};
 
 int32_t s_osIdle;  // OSIdle lands here, then in both idle flags
 
@@ -158,10 +159,13 @@ void report_if_missing(const char *devicePath) {
 
 }  // namespace
 
+void mmi_initconfig_set_list_builder(void (*build)(void)) {
+    s_buildLists = build;
+}
+
 int mmi_initconfig(void) {
     CFG_DEBUG("%s begin", __func__);
-    Get_MonomerPreviewTestItem_Config();
-    Get_TestItem_Config(0);
+    if (void (*build)(void) = s_buildLists.load()) build();
 
     memset(g_chLanguageName, 0, sizeof(g_chLanguageName));
     if (Read_MainCfgFile("MMI", "Language", g_chLanguageName, "Chinese") != 0) {
@@ -196,4 +200,12 @@ int mmi_initconfig(void) {
 
     CFG_DEBUG("%s end", __func__);
     return 0;
+}
+
+int Check_AgingCfg_Exist(void) {
+    // Joined into 256 bytes: a longer path is cut at 255 characters.
+    char path[256];
+    size_t n = tp_os_strlcpy(path, g_chLogPath, sizeof path);
+    tp_os_strlcpy(path + n, "rebootAging.txt", sizeof path - n);
+    return dev_access(path, R_OK) == 0 ? 1 : 0;
 }

@@ -37,6 +37,11 @@ extern char g_chAgingLogPath[MMI_TEXT_SIZE];
 extern std::atomic<int32_t> g_mmiPreFlag;
 extern std::atomic<int32_t> g_pretestMenuEnabled;
 
-// Builds the catalogue, loads the language texts and reads the settings above.
-// 0 when every step ran, -1 when it stopped early.
+// Builds the test lists (through the builder start-up hands in), loads the language texts
+// and reads the settings above. 0 when every step ran, -1 when it stopped early.
 int mmi_initconfig(void);
+// What mmi_initconfig calls to build the test lists; null builds nothing.
+void mmi_initconfig_set_list_builder(void (*build)(void));
+
+// 1 when the aging restart marker (rebootAging.txt in the log folder) is readable.
+int Check_AgingCfg_Exist(void);

@@ -25,11 +25,17 @@
 #include "mmi_dialog.h"
 #include "mmi_guithread.h"
 #include "adbd_connection/AtThread.h"
-#include "hub/mmi_hub_links.h"
 #include "mmi_menulist.h"
 #include "core/mmi_power.h"
 #include "core/mmi_settings.h"
+#include "pending/aging.h"
+#include "pending/coupling.h"
+#include "pending/wifi.h"
+#include "screens/mmi_devicetest.h"
+#include "screens/mmi_infoscreen.h"
+#include "session/mmi_monomer.h"
 #include "session/mmi_testitem.h"
+#include "mmi_theme.h"
 
 // Registered for "TPHARDWARE" when the touch-panel alert is confirmed in state 3.
 void Get_tpstatus_callback(module_data *data);
@@ -54,7 +60,6 @@ std::atomic<int> g_deviceIsAgingTest{0};
 std::atomic<int> g_dialogcouldshow{1};
 std::atomic<int> g_iCreateDialog{0};
 std::atomic<int> g_bWiFiConnectStatus{0};
-PLOGFONT g_mmiLogFont[7];
 
 namespace {
 
@@ -256,7 +261,7 @@ void refresh_title(HWND hWnd, bool draw) {
     bool known = mmi_battery_snapshot(&b) == 0 && b.batteryLevel != -1;
     char level[32] = "";
     if (known) snprintf(level, sizeof level, "%d%%", b.batteryLevel);
-    int colour = known && b.batteryLevel <= g_batteryWarningVolt ? 12 : 19;
+    int colour = known && b.batteryLevel <= g_batteryWarningVolt ? MMI_COLOUR_FAIL : MMI_COLOUR_TEXT;
     std::string charging = tr(known && mmi_battery_is_charging(&b) ? "BatteryCharging_Charging"
                                                                    : "BatteryCharging_Null");
     std::lock_guard<std::mutex> lk(s_titleMutex);
@@ -271,12 +276,12 @@ void refresh_title(HWND hWnd, bool draw) {
 void refresh_bars(HWND hWnd) {
     int state = mmi_wifi_link_state();
     const char *middleKey = nullptr;
-    int middleColour = 12;
+    int middleColour = MMI_COLOUR_FAIL;
     if (state == 1 || (state == 0 && mmi_wifi_init_flag())) {
         middleKey = "softkeybar_connect";
     } else if (state == 2) {
         middleKey = "softkeybar_disconnect";
-        middleColour = 7;
+        middleColour = MMI_COLOUR_GRAY;
     }
     std::string middle = middleKey ? tr(middleKey) : " ";
     tp_skb_set_text_items(hWnd, " ", middle.c_str(), " ");
@@ -293,7 +298,7 @@ void draw_link_picture(HWND hWnd, bool up) {
     HDC hdc = GetClientDC(hWnd);
     // The square is placed on the screen; the client starts below the title strip.
     int dy = -l.mainWindow.top;
-    SetBrushColor(hdc, SysPixelIndex[up ? 15 : 18]);
+    SetBrushColor(hdc, mmi_pixel(up ? MMI_COLOUR_WHITE : MMI_COLOUR_WINDOW));
     FillBox(hdc, l.linkSquare.left, l.linkSquare.top + dy, RECTW(l.linkSquare),
             RECTH(l.linkSquare));
     if (up) {
@@ -347,7 +352,7 @@ void on_link_key(HWND hWnd) {
     s_unlockCount = 0;
     if (mmi_wifi_link_state() < 2) {
         if (s_wifiConnecting) return;
-        show_middle(hWnd, "softkeybar_connecting", 9);
+        show_middle(hWnd, "softkeybar_connecting", MMI_COLOUR_BLUE);
         int r = mmi_wifi_probe_thread(MMI_WIFI_CON_THREAD);
         if (r == EINVAL) {
             LOGD("Send siganl fail.");
@@ -363,7 +368,7 @@ void on_link_key(HWND hWnd) {
         s_wifiConnecting = 1;
     }
     if (mmi_wifi_link_state() == 2) {
-        show_middle(hWnd, "softkeybar_disconnect", 9);
+        show_middle(hWnd, "softkeybar_disconnect", MMI_COLOUR_BLUE);
         wifi_close_thread(0);
         s_wifiConnecting = 0;
     }
@@ -382,13 +387,13 @@ void on_link_change(HWND hWnd) {
             LOGD("wifi_status_monitor_thread_start exists.do nothing.");
         }
         draw_link_picture(hWnd, true);
-        show_middle(hWnd, "softkeybar_disconnect", 7);
+        show_middle(hWnd, "softkeybar_disconnect", MMI_COLOUR_GRAY);
         g_bWiFiConnectStatus = 1;
         s_unlockCount = 0;
     } else {
         s_wifiConnecting = 0;
         draw_link_picture(hWnd, false);
-        show_middle(hWnd, "softkeybar_connect", 12);
+        show_middle(hWnd, "softkeybar_connect", MMI_COLOUR_FAIL);
         g_bWiFiConnectStatus = 0;
     }
 }
@@ -435,7 +440,7 @@ void create_menu(HWND hWnd) {
         return;
     }
     if (g_mmiLogFont[2]) SetWindowFont(list, g_mmiLogFont[2]);
-    SetWindowBkColor(list, SysPixelIndex[18]);
+    SetWindowBkColor(list, mmi_pixel(MMI_COLOUR_WINDOW));
     SendMessage(list, SVM_SETITEMDRAW, 0, (LPARAM)mmi_SVDrawItem);
     g_mainMenuCount = 0;
     int count = 0;
@@ -579,7 +584,7 @@ HWND create_hub_window(WNDPROC proc) {
     create.ty = l.mainWindow.top;
     create.rx = l.mainWindow.right;
     create.by = l.mainWindow.bottom;
-    create.iBkColor = SysPixelIndex[18];
+    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
     return CreateMainWindow(&create);
 }
 
@@ -614,35 +619,6 @@ void mmi_hub_layout_for(int w, int h, mmi_hub_layout *out) {
     SetRect(&out->linkSquare, w / 2 - s, h / 2 - s, w / 2 + s, h / 2 + s);
 }
 
-int mmi_logfont_size(int index, int w) {
-    switch (index) {
-        case 1:
-        case 2:
-            return w < 1365 ? w / 15 : 90;
-        case 3:
-            return w < 1725 ? (int)(((long long)w * 458129845LL) >> 33) & ~3 : 90;
-        case 4:
-            return w < 2415 ? (int)(((w + (((long long)w * 940802361LL) >> 32)) >> 1) >> 4) & ~3
-                            : 90;
-        case 5:
-            return 250;
-        case 6:
-            return 25;
-        default:
-            return 0;
-    }
-}
-
-void mmi_testwnd_InitLogFont(void) {
-    static const char kWeight[7] = {0, 'b', 'r', 'r', 'r', 'm', 'm'};
-    int w = g_ptScreenInfo.width;
-    for (int i = 1; i <= 6; i++) {
-        if (g_mmiLogFont[i]) continue;
-        g_mmiLogFont[i] = CreateLogFont("ttf", "song", "GB18030", kWeight[i], 'r', 'n', 'c', 'n',
-                                        'n', mmi_logfont_size(i, w), 0);
-    }
-}
-
 int mmi_powerkey_is_short(long long pressMs, long long releaseMs) {
     return releaseMs - pressMs < MMI_POWERKEY_LONG_MS ? 1 : 0;
 }
@@ -657,8 +633,8 @@ int TitleInfoShow(const char *text, int index, int abnormalState) {
         if (abnormalState == 1 && text) s_titleWarning = text;
         if (abnormalState == 0) s_titleWarning.clear();
     }
-    if (abnormalState == 0) tp_batteryshow_set_text_col(19);
-    if (abnormalState == 1) tp_batteryshow_set_text_col(12);
+    if (abnormalState == 0) tp_batteryshow_set_text_col(MMI_COLOUR_TEXT);
+    if (abnormalState == 1) tp_batteryshow_set_text_col(MMI_COLOUR_FAIL);
     std::string restore;
     if (!text && index == 1 && abnormalState == 0) {
         restore = tr("title_factory");
@@ -727,7 +703,7 @@ LRESULT mmi_ExampleWin_MenuWndProc(HWND hWnd, UINT message, WPARAM wParam, LPARA
             return 0;
         case MSG_PAINT: {
             HDC hdc = BeginPaint(hWnd);
-            SetPenColor(hdc, SysPixelIndex[10]);
+            SetPenColor(hdc, mmi_pixel(MMI_COLOUR_PASS));
             SetPenWidth(hdc, 3);
             MoveTo(hdc, 0, 0);
             LineTo(hdc, g_ptScreenInfo.width, 0);
@@ -804,7 +780,7 @@ LRESULT mmi_ExampleWin_MenuWndProc1(HWND hWnd, UINT message, WPARAM wParam, LPAR
         case MSG_TIMER: {
             if (wParam != MMI_TIMER_BARS) return 0;
             tp_skb_set_text_items(hWnd, " ", " ", " ");
-            tp_skb_set_text_col(19);
+            tp_skb_set_text_col(MMI_COLOUR_TEXT);
             tp_skb_update(hWnd);
             FTX_BATTERY_INFO b;
             char level[32] = "";
@@ -835,7 +811,7 @@ LRESULT mmi_ExampleWin_MenuWndProc1(HWND hWnd, UINT message, WPARAM wParam, LPAR
             HDC hdc = BeginPaint(hWnd);
             if (g_mmiLogFont[4]) SelectFont(hdc, g_mmiLogFont[4]);
             SetBkMode(hdc, BM_TRANSPARENT);
-            SetTextColor(hdc, SysPixelIndex[19]);
+            SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
             int fh = GetFontHeight(hdc);
             // Positions are screen rows; the client area starts below the title strip.
             int top = w / 15 + h / 4 + 10 - (w / 15 + 10);

@@ -43,12 +43,6 @@ struct mmi_hub_layout {
 };
 void mmi_hub_layout_for(int w, int h, mmi_hub_layout *out);
 
-// The six fonts (index 1..6); created by mmi_testwnd_InitLogFont.
-extern PLOGFONT g_mmiLogFont[7];
-void mmi_testwnd_InitLogFont(void);
-// Font sizes for screen width w (index 1..6).
-int mmi_logfont_size(int index, int w);
-
 // 1 when a press held from pressMs to releaseMs is a short press.
 int mmi_powerkey_is_short(long long pressMs, long long releaseMs);
 
@@ -60,10 +54,3 @@ int hookKeyProc(void *context, HWND dst, UINT msg, WPARAM wparam, LPARAM lparam)
 void ScrollViewProc(HWND hwnd, LINT id, int nc, DWORD add_data);
 // Sets one item of the title strip from any thread.
 int TitleInfoShow(const char *text, int index, int abnormalState);
-
-// 1 when the aging restart marker (rebootAging.txt in the log folder) is readable.
-int Check_AgingCfg_Exist(void);
-// The power-off dialog's first button: the device powers off.
-int mmi_PowerOffEntry(void);
-// Points power management at the bound library operations and the title strip.
-void mmi_power_use_bound_library(void);

@@ -16,15 +16,13 @@
 #include "session/mmi_testinfo.h"
 #include "testwnd/mmi_testwnd.h"
 #include "tp_os.h"
+#include "mmi_theme.h"
 
 #define DT_TAG "FTX_MAIN"
 #define DT_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, DT_TAG, __VA_ARGS__)
 
 namespace {
 
-const int kColourText = 19;
-const int kColourPass = 10;
-const int kColourFail = 12;
 
 // GUI thread only, apart from the handle and the pending flag.
 std::atomic<HWND> s_window{HWND_INVALID};
@@ -106,9 +104,9 @@ const mmi_listscreen_desc kList = {"Device Test", "menu_DeviceTest", 2,         
 }  // namespace
 
 int mmi_devicetest_result_colour(int result) {
-    if (result == MMI_RESULT_PASS) return kColourPass;
-    if (result == MMI_RESULT_FAIL) return kColourFail;
-    return kColourText;
+    if (result == MMI_RESULT_PASS) return MMI_COLOUR_PASS;
+    if (result == MMI_RESULT_FAIL) return MMI_COLOUR_FAIL;
+    return MMI_COLOUR_TEXT;
 }
 
 int mmi_devicetest_build_rows(const testitem_node *head, mmi_devicetest_row *rows, int max) {

@@ -2,8 +2,6 @@
 // configured item with its result in colour. MSG_TIMER with wParam 1 refreshes it.
 #pragma once
 
-#include "hub/mmi_hub_links.h"
-
 #include "mmi_msg.h"
 #include "session/mmi_testitem.h"
 

@@ -12,6 +12,7 @@
 
 #include "devfs.h"
 #include "core/ftx_lib_binding.h"
+#include "core/mmi_autotest_config.h"
 #include "session/mmi_autotest.h"
 #include "mmi_msg.h"
 #include "core/mmi_power.h"

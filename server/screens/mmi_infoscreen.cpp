@@ -13,14 +13,12 @@
 #include "screens/mmi_listscreen.h"
 #include "session/mmi_testinfo.h"
 #include "tp_os.h"
+#include "mmi_theme.h"
 
 #define INFO_TAG "FTX_MAIN"
 
 namespace {
 
-const int kColourText = 19;
-const int kColourPass = 10;
-const int kColourFail = 12;
 
 // GUI thread only, apart from the handle.
 std::atomic<HWND> s_window{HWND_INVALID};
@@ -59,7 +57,7 @@ int build_lines(void) {
         } else {
             mmi_identity_text(row.kind, l.value, sizeof(l.value));
         }
-        l.colour = kColourText;
+        l.colour = MMI_COLOUR_TEXT;
     }
     unsigned char flags[MMI_TESTINFO_FLAGS_SIZE] = {0};
     if (hw::ftx_api_GetTestInfoFlag) hw::ftx_api_GetTestInfoFlag(flags);
@@ -94,7 +92,7 @@ int mmi_info_record_lines(const unsigned char *flags, mmi_info_line *lines, int 
         mmi_info_line &l = lines[n++];
         snprintf(l.label, sizeof(l.label), "%d %s", g_testinfo[i].index, g_testinfo[i].context);
         tp_os_strlcpy(l.value, r == MMI_RESULT_PASS ? pass : fail, sizeof(l.value));
-        l.colour = r == MMI_RESULT_PASS ? kColourPass : kColourFail;
+        l.colour = r == MMI_RESULT_PASS ? MMI_COLOUR_PASS : MMI_COLOUR_FAIL;
     }
     return n;
 }

@@ -2,8 +2,6 @@
 // numbers, IMEI, flash type, then every item of the result record that passed or failed.
 #pragma once
 
-#include "hub/mmi_hub_links.h"
-
 #include "mmi_msg.h"
 
 #define MMI_INFO_LINE_SIZE 128

@@ -8,17 +8,14 @@
 #include "core/ftx_config.h"
 #include "mmi_bars.h"
 #include "mmi_guithread.h"
-#include "hub/mmi_mainwnd.h"
 #include "core/mmi_settings.h"
 #include "testwnd/mmi_testwnd.h"
 #include "tp_os.h"
+#include "mmi_theme.h"
 
 namespace {
 
 const int kListId = 21;
-const int kColourCursor = 7;
-const int kColourText = 19;
-const int kColourSeparator = 20;
 
 const mmi_listscreen_desc *desc_of(HWND hWnd) {
     return reinterpret_cast<const mmi_listscreen_desc *>(GetWindowAdditionalData(hWnd));
@@ -28,7 +25,7 @@ void show_bars(HWND hWnd, const mmi_listscreen_desc *d) {
     char title[MMI_TESTWND_TEXT_SIZE];
     tp_os_strlcpy(title, d->titleKey, sizeof(title));
     Read_LangCfgFromList(d->titleKey, title);
-    tp_skb_set_text_col(kColourText);
+    tp_skb_set_text_col(MMI_COLOUR_TEXT);
     tp_skb_set_text_items(hWnd, "", "", g_cItemBack);
     tp_skb_update(hWnd);
     tp_batteryshow_set_text_items(hWnd, "", title, "");
@@ -115,17 +112,17 @@ int mmi_listscreen_row(HSVITEM hsvi) {
 void mmi_listscreen_draw_row(HWND hWnd, HSVITEM hsvi, HDC hdc, const RECT *rc, const char *label,
                              const char *value, int colour) {
     if (scrollview_is_item_hilight(hWnd, hsvi)) {
-        SetBrushColor(hdc, SysPixelIndex[kColourCursor]);
+        SetBrushColor(hdc, mmi_pixel(MMI_COLOUR_GRAY));
         FillBox(hdc, rc->left, rc->top, RECTWP(rc), RECTHP(rc));
     }
     SetBkMode(hdc, BM_TRANSPARENT);
-    SetTextColor(hdc, SysPixelIndex[colour]);
+    SetTextColor(hdc, mmi_pixel(colour));
     RECT text = *rc;
     text.left += RECTWP(rc) / 20;
     text.right -= RECTWP(rc) / 20;
     DrawText(hdc, label, -1, &text, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
     if (value && value[0]) DrawText(hdc, value, -1, &text, DT_RIGHT | DT_VCENTER | DT_SINGLELINE);
-    SetPenColor(hdc, SysPixelIndex[kColourSeparator]);
+    SetPenColor(hdc, mmi_pixel(MMI_COLOUR_FRAME));
     MoveTo(hdc, rc->left, rc->bottom - 1);
     LineTo(hdc, rc->right, rc->bottom - 1);
 }

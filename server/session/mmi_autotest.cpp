@@ -11,7 +11,7 @@
 #include "devfs.h"
 #include "core/ftx_config.h"
 #include "core/ftx_lib_binding.h"
-#include "screens/mmi_devicetest.h"
+#include "core/mmi_autotest_config.h"
 #include "session/mmi_runstate.h"
 #include "core/mmi_settings.h"
 #include "session/mmi_testinfo.h"
@@ -33,6 +33,12 @@ int lcd_off_default(void) {
     return hw::ftx_api_LCD_Off ? hw::ftx_api_LCD_Off() : -1;
 }
 
+// Until start-up hands in the device-test list there is none to open.
+int no_device_list(void) {
+    return 0;
+}
+void no_refresh(void) {}
+
 void exit_default(int status) {
     fflush(nullptr);
     exit(status);
@@ -48,9 +54,9 @@ mmi_autotest_ops mmi_autotest_default_ops(void) {
     ops.modify_config = mmi_AutoTest_Modify_ConfigFile;
     ops.build_list = Get_TestItem_Config;
     ops.build_aux_list = Get_AuxLCD_TestItem_Config;
-    ops.open_device_list = mmi_DeviceTestEntry;
-    ops.device_list_is_open = mmi_DeviceTest_IsOpen;
-    ops.refresh_device_list = mmi_DeviceTest_Refresh;
+    ops.open_device_list = no_device_list;
+    ops.device_list_is_open = no_device_list;
+    ops.refresh_device_list = no_refresh;
     ops.lcd_off = lcd_off_default;
     ops.exit_process = exit_default;
     ops.sleep_us = tp_os_usleep;
@@ -338,4 +344,29 @@ int mmi_autotest_write_latest_pass(const char *text) {
         return -1;
     }
     return 0;
+}
+
+namespace {
+
+void run_pass(int resultIndex, const char *domain) {
+    if (g_bAutoTestRunning != 1) return;
+    mmi_write_testinfo_single_byte(resultIndex, 1);
+    mmi_startNextItemTest(domain);
+}
+
+void run_fail(int resultIndex) {
+    if (g_bAutoTestRunning == 1) mmi_write_testinfo_single_byte(resultIndex, 2);
+    mmi_autotest_end_run("fail");
+}
+
+void run_windows_closed(void) {
+    if (g_bAutoTestRunning == 1) mmi_autotest_end_run("test window closed");
+}
+
+const mmi_run_ops kRun = {run_pass, run_fail, run_windows_closed};
+
+}  // namespace
+
+void mmi_autotest_install_run(void) {
+    mmi_run_install(MMI_RUN_AUTO, &kRun);
 }

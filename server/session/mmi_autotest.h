@@ -61,10 +61,7 @@ int mmi_autotest_write_latest_pass(const char *text);
 int mmi_AutoTestEntry(void);
 int mmi_AutoTestEntry_Ex(void);
 int mmi_AutoTestEntry_Ex2(void);
-// Called by a test window after a pass in a run, with its own domain.
+// Called after a pass in a run, with the window's own domain.
 int mmi_startNextItemTest(const char *domain);
-
-// Rewrites one key of the main configuration: parm is "DOMAIN,key,value". 1 on success.
-int mmi_AutoTest_Modify_ConfigFile(const char *parm);
-// Makes the system partition (which holds /etc) writable. 0 on success.
-int remount_system_partition(void);
+// Makes the sequence the receiver of what the automatic run's test windows report.
+void mmi_autotest_install_run(void);

@@ -4,6 +4,7 @@
 #include <android/log.h>
 
 #include "session/mmi_autotest.h"
+#include "session/mmi_runstate.h"
 #include "session/mmi_testitem.h"
 
 #define MP_DEBUG(...) __android_log_print(ANDROID_LOG_DEBUG, "FTX_MAIN", __VA_ARGS__)
@@ -36,4 +37,26 @@ int mmi_startNextMonomerPreviewItemTest(const char *domain) {
     MP_DEBUG("%s preview done", __func__);
     g_bMonomerPreviewRunning = 0;
     return 1;
+}
+
+namespace {
+
+void run_pass(int, const char *domain) {
+    if (g_bMonomerPreviewRunning == 1) mmi_startNextMonomerPreviewItemTest(domain);
+}
+
+void run_stop(int) {
+    g_bMonomerPreviewRunning = 0;
+}
+
+void run_windows_closed(void) {
+    g_bMonomerPreviewRunning = 0;
+}
+
+const mmi_run_ops kRun = {run_pass, run_stop, run_windows_closed};
+
+}  // namespace
+
+void mmi_monomer_install_run(void) {
+    mmi_run_install(MMI_RUN_MONOMER, &kRun);
 }

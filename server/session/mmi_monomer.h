@@ -2,8 +2,6 @@
 // another. Nothing is recorded: the run only shows each screen in turn.
 #pragma once
 
-#include "hub/mmi_hub_links.h"
-
 #include <atomic>
 
 // 1 while the preview runs.
@@ -14,3 +12,5 @@ int mmi_testwnd_MonomerPreview_Entry(void);  // 0, or -1 when nothing is enabled
 // Called by a preview screen when it is done, with its own domain: opens the next item,
 // or ends the preview after the last one. 0 when a next item was opened, 1 at the end.
 int mmi_startNextMonomerPreviewItemTest(const char *domain);
+// Makes the preview the receiver of what its screens report.
+void mmi_monomer_install_run(void);

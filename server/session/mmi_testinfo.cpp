@@ -230,3 +230,9 @@ int mmi_WriteFuncTestInfoFlags(int, unsigned char) {
 int mmi_ReadFuncTestInfoFlags(int, unsigned char *) {
     return 0;
 }
+
+void mmi_testinfo_hand_binding_fallbacks(void) {
+    static const ftx_binding_fallbacks kFallbacks = {mmi_ReadFuncTestInfoFlags,
+                                                     mmi_WriteFuncTestInfoFlags};
+    ftx_binding_set_fallbacks(&kFallbacks);
+}

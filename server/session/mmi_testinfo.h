@@ -57,3 +57,5 @@ int CheckParaResult(const char *spec, int value, int isMax);
 // Stand-ins bound when the library lacks the flag operations: nothing happens, 0.
 int mmi_WriteFuncTestInfoFlags(int index, unsigned char value);
 int mmi_ReadFuncTestInfoFlags(int index, unsigned char *value);
+// Hands the two stand-ins to the binding (before the factory library is bound).
+void mmi_testinfo_hand_binding_fallbacks(void);

@@ -1,4 +1,4 @@
-// The compiled-in test item catalogue and the lists built from it and the configuration.
+// The test item lists of the runs, built from the catalogue and the configuration.
 #pragma once
 
 #include <stdint.h>
@@ -28,13 +28,19 @@ struct testitem_node : testitem {
     testitem_node *pNodeNext;
 };
 
-// The tables; their rows are updated in place by the builders.
-extern testitem TestItemWinMenu_TOTAL[];
-extern int g_testitemnum_total;  // 38
-extern testitem AuxLCD_TestItemWinMenu_TOTAL[];
-extern int g_AuxLCD_testitemnum_total;  // 5
-extern testitem MonomerPreview_TestItemWinMenu_TOTAL[];
-extern int g_MonomerPreview_testitemnum_total;  // 4
+// The catalogue's tables the lists are built from (the full run, the auxiliary-LCD run and
+// the monomer preview); their rows are updated in place by the builders.
+struct testitem_table {
+    testitem *rows;
+    int count;
+};
+struct mmi_catalogue {
+    testitem_table main;
+    testitem_table auxLcd;
+    testitem_table monomer;
+};
+// Start-up hands the catalogue in before any list is built; until then the lists are empty.
+void mmi_testitem_use_catalogue(const mmi_catalogue *catalogue);
 
 // The test item list (main and auxiliary-LCD builds) and the monomer preview list.
 extern testitem_node *g_pTestItemListHead;
@@ -48,6 +54,9 @@ extern int g_monomerPreviewListCount;
 int Get_TestItem_Config(int reset);
 int Get_AuxLCD_TestItem_Config(int reset);
 int Get_MonomerPreviewTestItem_Config(void);
+
+// The lists every start builds: the monomer preview's, then the main one (reset 0).
+void mmi_build_test_lists(void);
 
 // Main-table row whose config_domain is a prefix of domain, or -1.
 int ftx_config_Get_TestItem_Config_Paras(const char *domain);

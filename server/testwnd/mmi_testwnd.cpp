@@ -1,4 +1,4 @@
-// The test-window framework and the table of tests that follow its pattern.
+// The test-window framework: the generic window and the helpers every test window uses.
 #include "testwnd/mmi_testwnd.h"
 
 #include <errno.h>
@@ -12,38 +12,18 @@
 #include <android/log.h>
 
 #include "core/ftx_config.h"
-#include "session/mmi_autotest.h"
 #include "mmi_bars.h"
 #include "minigui/control.h"
 #include "mmi_guithread.h"
-#include "hub/mmi_mainwnd.h"
-#include "session/mmi_monomer.h"
-#include "session/mmi_runstate.h"
-#include "session/mmi_testinfo.h"
 #include "tp_os.h"
+#include "mmi_theme.h"
 
 #define TW_DEBUG(tag, ...) __android_log_print(ANDROID_LOG_DEBUG, tag, __VA_ARGS__)
 #define TW_ERROR(tag, ...) __android_log_print(ANDROID_LOG_ERROR, tag, __VA_ARGS__)
 
 namespace {
 
-mmi_testwnd_state s_vibrator;
-mmi_testwnd_state s_hardVersion;
-
-// The panel firmware as the library describes it.
-void firmware_note(char *out, unsigned int size) {
-    char buf[FTX_FIRMWARE_TEXT_SIZE] = {0};
-    if (!hw::ftx_api_GetFireWare || hw::ftx_api_GetFireWare(buf) != 0) {
-        TW_ERROR("FTX_MONOMER_HARDVERSION", "%s ftx_api_GetFireWare fail", __func__);
-    }
-    buf[sizeof(buf) - 1] = '\0';
-    tp_os_strlcpy(out, buf, size);
-}
-
 // Colours of the system pixel table.
-const int kColourPassLine = 10;
-const int kColourText = 19;
-const int kColourWindow = 18;
 
 std::mutex s_currentLock;
 char s_currentTest[MMI_TESTWND_TEXT_SIZE];
@@ -93,30 +73,18 @@ int close_window(void *hWnd) {
 }
 
 void hw_stop(const mmi_testwnd_desc *d) {
-    if (d->stop && *d->stop) (*d->stop)();
+    if (d->stop.bound()) (*d->stop.op)();
+}
+
+const char *domain_of(const mmi_testwnd_desc *d) {
+    return d->row->domain;
+}
+
+const char *title_of(const mmi_testwnd_desc *d) {
+    return d->titleKey != nullptr ? d->titleKey : d->row->titleKey;
 }
 
 }  // namespace
-
-// ---- the table ----
-
-const mmi_testwnd_desc g_testwndTable[] = {
-    {"Vibration Test", "title_VibratorTest", "info_VibratorNote", 316, "FTX_VIBRATOR", 3,
-     &hw::ftx_api_Vibrator_Test_Start, &hw::ftx_api_Vibrator_Test_Stop,
-     "ftx_api_Vibrator_Test_Start", "ftx_api_Vibrator_Test_Stop", 500, 200, &s_vibrator,
-     mmi_testwnd_VibratorTest_Stop_Entry, MMI_TESTWND_RUN_AUTO, nullptr, nullptr},
-    {"Hardware Version", "menu_NfcTest", "", -1, "FTX_MONOMER_HARDVERSION", 1, nullptr, nullptr, "",
-     "", 0, 0, &s_hardVersion, mmi_testwnd_Monomer_HardwareVersion_Stop, MMI_TESTWND_RUN_MONOMER,
-     Init_lib_HardVersion_Interface, firmware_note},
-};
-const int g_testwndCount = sizeof(g_testwndTable) / sizeof(g_testwndTable[0]);
-
-const mmi_testwnd_desc *mmi_testwnd_find(const char *domain) {
-    for (int i = 0; i < g_testwndCount; i++) {
-        if (strcmp(g_testwndTable[i].domain, domain) == 0) return &g_testwndTable[i];
-    }
-    return nullptr;
-}
 
 // ---- shared state ----
 
@@ -161,8 +129,7 @@ int Check_AllTestWnd_Closed(void) {
         closed++;
     }
     // A run waits for a key in its window; with the window gone no pass or fail can come.
-    if (closed > 0 && g_bAutoTestRunning == 1) mmi_autotest_end_run("test window closed");
-    if (closed > 0) g_bMonomerPreviewRunning = 0;  // the same for a preview
+    if (closed > 0) mmi_run_windows_closed();
     return closed;
 }
 
@@ -187,7 +154,7 @@ HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
     create.ty = rc.top;
     create.rx = rc.right;
     create.by = rc.bottom;
-    create.iBkColor = SysPixelIndex[kColourWindow];
+    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
     create.dwAddData = addData;
     HWND hWnd = CreateMainWindow(&create);
     if (hWnd == HWND_INVALID)
@@ -196,7 +163,7 @@ HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
 }
 
 void mmi_testwnd_draw_top_line(HDC hdc) {
-    SetPenColor(hdc, SysPixelIndex[kColourPassLine]);
+    SetPenColor(hdc, mmi_pixel(MMI_COLOUR_PASS));
     SetPenWidth(hdc, 3);
     MoveTo(hdc, 0, 0);
     LineTo(hdc, g_ptScreenInfo.width, 0);
@@ -214,7 +181,7 @@ void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam) {
     mmi_translate("Result_pass", pass, sizeof(pass));
     mmi_translate("Result_fail", fail, sizeof(fail));
     mmi_translate(titleKey, title, sizeof(title));
-    tp_skb_set_text_col(kColourText);
+    tp_skb_set_text_col(MMI_COLOUR_TEXT);
     if (wParam == MMI_TIMER_FOOLPROOF) {
         tp_skb_set_text_items(hWnd, pass, "", fail);
     } else {
@@ -290,30 +257,19 @@ void mmi_testwnd_stop_foolproof(mmi_testwnd_state *st) {
 }
 
 void mmi_testwnd_record_pass(int resultIndex, const char *domain) {
-    if (g_bAutoTestRunning != 1) return;
-    mmi_write_testinfo_single_byte(resultIndex, 1);
-    mmi_startNextItemTest(domain);
+    mmi_run_pass(MMI_RUN_AUTO, resultIndex, domain);
 }
 
 void mmi_testwnd_record_fail(int resultIndex) {
-    if (g_bAutoTestRunning == 1) mmi_write_testinfo_single_byte(resultIndex, 2);
-    mmi_autotest_end_run("fail");
+    mmi_run_fail(MMI_RUN_AUTO, resultIndex);
 }
 
 void mmi_testwnd_pass(const mmi_testwnd_desc *d) {
-    if (d->run == MMI_TESTWND_RUN_MONOMER) {
-        if (g_bMonomerPreviewRunning == 1) mmi_startNextMonomerPreviewItemTest(d->domain);
-        return;
-    }
-    mmi_testwnd_record_pass(d->resultIndex, d->domain);
+    mmi_run_pass(d->run, d->row->resultIndex, domain_of(d));
 }
 
 void mmi_testwnd_fail(const mmi_testwnd_desc *d) {
-    if (d->run == MMI_TESTWND_RUN_MONOMER) {
-        g_bMonomerPreviewRunning = 0;
-        return;
-    }
-    mmi_testwnd_record_fail(d->resultIndex);
+    mmi_run_fail(d->run, d->row->resultIndex);
 }
 
 // ---- the generic window ----
@@ -326,24 +282,24 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             d = reinterpret_cast<const mmi_testwnd_desc *>(
                 reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
             char title[MMI_TESTWND_TEXT_SIZE];
-            mmi_translate(d->titleKey, title, sizeof(title));
+            mmi_translate(title_of(d), title, sizeof(title));
             HWND ctrl =
                 CreateWindowEx(CTRL_STATIC, title, WS_VISIBLE | WS_BORDER | SS_CENTER | SS_NOPREFIX,
                                WS_EX_NONE, MMI_TESTWND_TITLE_ID, 0, 0, w, 0, hWnd, 0);
             if (g_mmiLogFont[1] && ctrl != HWND_INVALID) SetWindowFont(ctrl, g_mmiLogFont[1]);
             if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
             d->state->hwnd = hWnd;
-            if (d->start && *d->start) (*d->start)(d->state->mode.load());
-            mmi_set_current_test(d->domain);
-            mmi_testwnd_start_foolproof(d->state, d->foolProofSeconds, d->domain);
+            if (d->start.bound()) (*d->start.op)(d->state->mode.load());
+            mmi_set_current_test(domain_of(d));
+            mmi_testwnd_start_foolproof(d->state, d->foolProofSeconds, domain_of(d));
             break;
         }
         case MSG_TIMER:
-            mmi_testwnd_show_keys(hWnd, d->titleKey, wParam);
+            mmi_testwnd_show_keys(hWnd, title_of(d), wParam);
             break;
         case MSG_KEYDOWN:
             if (wParam == MMI_KEY_PASS) {
-                TW_DEBUG(d->domain, "%s pass", __func__);
+                TW_DEBUG(domain_of(d), "%s pass", __func__);
                 hw_stop(d);
                 tp_os_usleep(100000);
                 SendMessage(hWnd, MSG_CLOSE, 0, 0);
@@ -373,7 +329,7 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             } else {
                 mmi_translate(d->noteKey, note, sizeof(note));
             }
-            SetTextColor(hdc, SysPixelIndex[kColourText]);
+            SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
             SetBkMode(hdc, BM_TRANSPARENT);
             RECT rc = {w / 8, w / 15 + 10, (w / 4) * 3 + w / 8, h - (h / 15 + 10)};
             DrawText(hdc, note, -1, &rc, DT_WORDBREAK);
@@ -396,7 +352,7 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
 
 HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
     if (d->bind && d->bind() != 0) {
-        TW_ERROR(d->domain, "%s::bind fail, test not opened", __func__);
+        TW_ERROR(domain_of(d), "%s::bind fail, test not opened", __func__);
         return HWND_INVALID;
     }
     d->state->mode = mode;
@@ -408,7 +364,7 @@ HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
     // The bars keep a record per shown window: this one's starts with the fail label only.
     tp_skb_set_text_items(hWnd, "", "", "");
     tp_batteryshow_set_text_items(hWnd, "", "", "");
-    mmi_testwnd_show_keys(hWnd, d->titleKey, 0);
+    mmi_testwnd_show_keys(hWnd, title_of(d), 0);
     return hWnd;
 }
 
@@ -425,53 +381,25 @@ int mmi_testwnd_close(const mmi_testwnd_desc *d) {
 int mmi_testwnd_pc_start(const mmi_testwnd_desc *d, int mode) {
     Check_AllTestWnd_Closed();
     d->state->mode = mode;
-    if (!d->start || !*d->start) return 1;
-    TW_DEBUG(d->domain, "%s::%s(%d) begin", __func__, d->startName, mode);
-    if ((*d->start)(mode) != 0) {
-        TW_DEBUG(d->domain, "%s::%s fail", __func__, d->startName);
+    if (!d->start.bound()) return 1;
+    TW_DEBUG(domain_of(d), "%s::%s(%d) begin", __func__, d->start.name, mode);
+    if ((*d->start.op)(mode) != 0) {
+        TW_DEBUG(domain_of(d), "%s::%s fail", __func__, d->start.name);
         return 0;
     }
-    TW_DEBUG(d->domain, "%s::%s end", __func__, d->startName);
+    TW_DEBUG(domain_of(d), "%s::%s end", __func__, d->start.name);
     return 1;
 }
 
 int mmi_testwnd_pc_stop(const mmi_testwnd_desc *d) {
-    if (d->stop && *d->stop) {
-        TW_DEBUG(d->domain, "%s::%s begin", __func__, d->stopName);
-        if ((*d->stop)() != 0) {
-            TW_DEBUG(d->domain, "%s::%s fail", __func__, d->stopName);
+    if (d->stop.bound()) {
+        TW_DEBUG(domain_of(d), "%s::%s begin", __func__, d->stop.name);
+        if ((*d->stop.op)() != 0) {
+            TW_DEBUG(domain_of(d), "%s::%s fail", __func__, d->stop.name);
             return 0;
         }
-        TW_DEBUG(d->domain, "%s::%s end", __func__, d->stopName);
+        TW_DEBUG(domain_of(d), "%s::%s end", __func__, d->stop.name);
     }
     tp_os_usleep((unsigned long)d->pcStopSleepMs * 1000UL);
     return 1;
-}
-
-// ---- the vibrator ----
-
-void *mmi_testwnd_VibratorTestEntry(void) {
-    return mmi_testwnd_open(&g_testwndTable[0], 0);
-}
-
-int mmi_testwnd_VibratorTest_Stop_Entry(void) {
-    return mmi_testwnd_close(&g_testwndTable[0]);
-}
-
-int mmi_AutoTest_VibratorTestEntry(int mode) {
-    return mmi_testwnd_pc_start(&g_testwndTable[0], mode);
-}
-
-int mmi_AutoTest_VibratorTest_Stop_Entry(void) {
-    return mmi_testwnd_pc_stop(&g_testwndTable[0]);
-}
-
-// ---- the monomer preview's hardware version ----
-
-void *mmi_testwnd_Monomer_HardwareVersionEntry(void) {
-    return mmi_testwnd_open(&g_testwndTable[1], 0);
-}
-
-int mmi_testwnd_Monomer_HardwareVersion_Stop(void) {
-    return mmi_testwnd_close(&g_testwndTable[1]);
 }

@@ -1,7 +1,7 @@
 // The test-window framework: one window procedure serves every test that follows the
-// common pattern (title, note, delayed pass label, pass and fail keys, result recording and
-// the next item of a run), driven by a row of the descriptor table. Tests with their own
-// procedure reuse the helpers below.
+// common pattern (title, note, delayed pass label, pass and fail keys, and the report of the
+// result to the run that opened the window), driven by the family's descriptor. Tests with
+// their own procedure reuse the helpers below.
 #pragma once
 
 #include <pthread.h>
@@ -11,6 +11,8 @@
 
 #include "core/ftx_lib_binding.h"
 #include "mmi_msg.h"
+#include "session/mmi_runstate.h"
+#include "testwnd/catalogue.h"
 
 #define MMI_TESTWND_TEXT_SIZE 256
 
@@ -22,8 +24,17 @@
 // Identifier of a test window's title control.
 #define MMI_TESTWND_TITLE_ID 20
 
-typedef ftx_hw_op<int (*)(int)> mmi_hw_start_op;
-typedef ftx_hw_op<int (*)(void)> mmi_hw_stop_op;
+// A bound operation and its name in the log; written MMI_HW_OP(ftx_api_...), so the name
+// is never a second string.
+template <typename F>
+struct mmi_hw_named_op {
+    ftx_hw_op<F> *op;
+    const char *name;
+    bool bound() const { return op != nullptr && *op != nullptr; }
+};
+#define MMI_HW_OP(slot) {&hw::slot, #slot}
+typedef mmi_hw_named_op<int (*)(int)> mmi_hw_start_op;
+typedef mmi_hw_named_op<int (*)(void)> mmi_hw_stop_op;
 
 // Run-time state of one test's window.
 struct mmi_testwnd_state {
@@ -39,35 +50,25 @@ struct mmi_testwnd_state {
     std::atomic<unsigned> generation{0};
 };
 
+// A test family that follows the common pattern, written with designated initializers.
 struct mmi_testwnd_desc {
-    const char *caption;     // window caption
-    const char *titleKey;    // title strip item 1 and the title control
-    const char *noteKey;     // body text
-    int resultIndex;         // item of the result record
-    const char *domain;      // configuration domain, also the log tag
-    int foolProofSeconds;    // before the pass label shows
-    mmi_hw_start_op *start;  // hardware start, given the mode variable
-    mmi_hw_stop_op *stop;
-    const char *startName;  // the operations' names in the log
-    const char *stopName;
-    int stopEntrySleepMs;  // after the stop entry closed the window
-    int pcStopSleepMs;     // after the PC stop entry
-    mmi_testwnd_state *state;
-    int (*stopEntry)(void);  // closes the window from outside
-    // Which run a pass hands over to: the automatic sequence or the monomer preview.
-    int run;
-    int (*bind)(void);                           // per-feature binder, null when none
-    void (*note)(char *out, unsigned int size);  // body text instead of noteKey, or null
+    const mmi_catalogue_row *row;     // domain (also the log tag), result item, title key
+    const char *caption;              // window caption
+    const char *titleKey = nullptr;   // title strip and title control, when not the row's
+    const char *noteKey = "";         // body text
+    int foolProofSeconds = 0;         // before the pass label shows
+    mmi_hw_start_op start = {};       // hardware start, given the mode variable
+    mmi_hw_stop_op stop = {};
+    int stopEntrySleepMs = 0;         // after the stop entry closed the window
+    int pcStopSleepMs = 0;            // after the PC stop entry
+    mmi_testwnd_state *state = nullptr;
+    int (*stopEntry)(void) = nullptr;  // closes the window from outside
+    int run = MMI_RUN_AUTO;            // the run a pass or fail is reported to
+    int (*bind)(void) = nullptr;       // per-feature binder, null when none
+    void (*note)(char *out, unsigned int size) = nullptr;  // body text instead of noteKey
 };
 
-#define MMI_TESTWND_RUN_AUTO 0
-#define MMI_TESTWND_RUN_MONOMER 1
 #define MMI_TESTWND_NOTE_SIZE 1024
-
-// Every generic test window, in one table.
-extern const mmi_testwnd_desc g_testwndTable[];
-extern const int g_testwndCount;
-const mmi_testwnd_desc *mmi_testwnd_find(const char *domain);
 
 // The generic pattern.
 HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode);
@@ -92,7 +93,7 @@ void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam);
 int mmi_testwnd_start_foolproof(mmi_testwnd_state *st, int seconds, const char *tag);
 // Ends a fool-proof thread that still sleeps (SIGUSR1) and forgets its window.
 void mmi_testwnd_stop_foolproof(mmi_testwnd_state *st);
-// Pass or fail of a test: recorded and chained only while a run is active.
+// Pass or fail of a test in the automatic run (recorded and chained only while it runs).
 void mmi_testwnd_record_pass(int resultIndex, const char *domain);
 void mmi_testwnd_record_fail(int resultIndex);
 // The same for a window of either run kind.
@@ -110,13 +111,3 @@ void mmi_get_current_test(char *out, size_t size);
 void mmi_testwnd_register_open(HWND hWnd, int (*stop)(void));
 void mmi_testwnd_unregister(HWND hWnd);
 int Check_AllTestWnd_Closed(void);
-
-// The vibrator, the first user of the table.
-void *mmi_testwnd_VibratorTestEntry(void);
-int mmi_testwnd_VibratorTest_Stop_Entry(void);
-int mmi_AutoTest_VibratorTestEntry(int mode);
-int mmi_AutoTest_VibratorTest_Stop_Entry(void);
-
-// The monomer preview's hardware version screen: the panel firmware, judged by the operator.
-void *mmi_testwnd_Monomer_HardwareVersionEntry(void);
-int mmi_testwnd_Monomer_HardwareVersion_Stop(void);

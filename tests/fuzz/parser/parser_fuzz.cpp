@@ -12,7 +12,7 @@
 #include <utility>
 
 #include "adbd_connection/AtCmdTable.h"
-#include "adbd_connection/AutoTestHandlers.h"
+#include "adbd_connection/handlers/handlers.h"
 #include "adbd_connection/CmdParse.h"
 #include "core/ftx_lib_binding.h"
 #include "session/mmi_testinfo.h"

@@ -7,6 +7,7 @@
 #include "adbd_connection/AtThread.h"
 #include "ftx_host.h"
 #include "core/ftx_lib_binding.h"
+#include "mmi_startup.h"
 #include "session/mmi_testinfo.h"
 
 namespace {
@@ -55,6 +56,7 @@ const struct {
 
 int main(int argc, char **argv) {
     setvbuf(stdout, nullptr, _IOLBF, 0);
+    mmi_startup_wire();  // as the program does before binding
     ftx_log_set_capture(print_log, nullptr);
     for (int i = 1; i < argc; i++) {
         bool known = false;

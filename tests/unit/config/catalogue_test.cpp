@@ -7,11 +7,18 @@
 #include <gtest/gtest.h>
 
 #include "session/mmi_testitem.h"
-#include "testwnd/mmi_testitem_entries.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
+#include "mmi_startup.h"
+#include "pending/audio.h"
+#include "pending/display.h"
+#include "pending/sensors.h"
+#include "testwnd/catalogue.h"
 
 namespace {
+
+// The tables and the list builder are handed in as at start-up.
+[[maybe_unused]] const bool kWired = (mmi_startup_wire(), true);
 
 std::vector<std::string> domains(const testitem_node *head) {
     std::vector<std::string> out;

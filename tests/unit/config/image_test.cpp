@@ -15,10 +15,15 @@
 #include "session/mmi_testitem.h"
 #include "support/temp_root.h"
 #include "tp_os.h"
+#include "mmi_startup.h"
+#include "testwnd/catalogue.h"
 
 extern "C" const TP_I18N_DOMAIN language_domains[];
 
 namespace {
+
+// The tables and the list builder are handed in as at start-up.
+[[maybe_unused]] const bool kWired = (mmi_startup_wire(), true);
 
 std::string image_dir() {
     const char *src = getenv("FTX_SOURCE_DIR");

@@ -9,8 +9,12 @@
 #include "core/mmi_settings.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
+#include "mmi_startup.h"
 
 namespace {
+
+// The tables and the list builder are handed in as at start-up.
+[[maybe_unused]] const bool kWired = (mmi_startup_wire(), true);
 
 const char *kLanguage =
     "[Chinese]\r\nResult_pass=\xcd\xa8\xb9\xfd\r\n"

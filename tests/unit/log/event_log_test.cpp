@@ -52,7 +52,7 @@ class EventLog : public ::testing::Test {
 TEST_F(EventLog, MainLogCreatesItsDirectoriesAndAppends) {
     snprintf(g_chLogPath, MMI_TEXT_SIZE, "/cache/ftx/");
     root.write("/cache/keep", "");
-    ASSERT_EQ(0, ftx_initlog());
+    ASSERT_EQ(0, ftx_initlog(g_chLogPath));
     ASSERT_NE(nullptr, s_logFp);
     EXPECT_EQ(0, writeftxlog(s_logFp, "Label", "text %d", 1));
     uninit_ftxlog(s_logFp);
@@ -61,7 +61,7 @@ TEST_F(EventLog, MainLogCreatesItsDirectoriesAndAppends) {
     ASSERT_EQ(0, stat(root.host("/cache/ftx").c_str(), &st));
     EXPECT_TRUE(S_ISDIR(st.st_mode));
     // An existing log grows.
-    ASSERT_EQ(0, ftx_initlog());
+    ASSERT_EQ(0, ftx_initlog(g_chLogPath));
     EXPECT_EQ(0, writeftxlog_NoTime(s_logFp, "Label", "%s", "text"));
     uninit_ftxlog(s_logFp);
     s_logFp = nullptr;
@@ -85,7 +85,7 @@ TEST_F(EventLog, OpenFailureLeavesNoStream) {
     EXPECT_EQ(nullptr, fp);
     EXPECT_TRUE(log.has("make dirctory fail"));
     snprintf(g_chLogPath, MMI_TEXT_SIZE, "/data/file/sub/");
-    EXPECT_EQ(-1, ftx_initlog());
+    EXPECT_EQ(-1, ftx_initlog(g_chLogPath));
     EXPECT_TRUE(log.has("E FTXLOG: ftx_initlog:L357:init_ftx_log(ftx.log) fail."));
 }
 

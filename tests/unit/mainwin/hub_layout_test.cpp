@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "hub/mmi_mainwnd.h"
+#include "mmi_theme.h"
 
 namespace {
 

@@ -12,13 +12,14 @@
 
 #include <gtest/gtest.h>
 
-#include "adbd_connection/autotest_handlers_device.h"
+#include "adbd_connection/handlers/handlers.h"
 #include "ftx_host.h"
 #include "core/ftx_lib_binding.h"
 #include "screens/mmi_devicetest.h"
 #include "screens/mmi_identity.h"
 #include "screens/mmi_infoscreen.h"
 #include "session/mmi_testinfo.h"
+#include "testwnd/misc/mmi_testwnd_vibrator.h"
 #include "testwnd/mmi_testwnd.h"
 
 namespace {
