@@ -19,7 +19,6 @@ int g_bKeyValid = 0;
 
 namespace {
 
-
 // Records alive, and the latest one; hooks and CloseButton run off the GUI thread.
 std::mutex s_lock;
 std::set<MMI_DIALOG *> &s_live = *new std::set<MMI_DIALOG *>;
@@ -46,7 +45,8 @@ void set_button_colour(MMI_DIALOG *dlg, int i, int colour) {
 
 void select_button(MMI_DIALOG *dlg, int i, bool highlight) {
     if (i >= dlg->buttonCount) return;
-    if (dlg->selected >= 0 && dlg->selected != i) set_button_colour(dlg, dlg->selected, MMI_COLOUR_CONTROL);
+    if (dlg->selected >= 0 && dlg->selected != i)
+        set_button_colour(dlg, dlg->selected, MMI_COLOUR_CONTROL);
     dlg->selected = i;
     if (highlight) set_button_colour(dlg, i, MMI_COLOUR_HILIGHT);
 }

@@ -6,7 +6,6 @@
 
 #include <android/log.h>
 
-
 namespace hw {
 #define FTX_HW_DEFINE_OP(name) ftx_hw_op<decltype(&::name)> name;
 FTX_FACTORY_OPS(FTX_HW_DEFINE_OP)

@@ -25,7 +25,6 @@
 std::atomic<int> g_bCurrentSleepStatus{0};
 std::atomic<long long> g_LastInputTime{0};
 
-
 namespace {
 
 // Lock order: battery mutex first, then the sleep mutex. The warning mutex is never held

@@ -261,7 +261,8 @@ void refresh_title(HWND hWnd, bool draw) {
     bool known = mmi_battery_snapshot(&b) == 0 && b.batteryLevel != -1;
     char level[32] = "";
     if (known) snprintf(level, sizeof level, "%d%%", b.batteryLevel);
-    int colour = known && b.batteryLevel <= g_batteryWarningVolt ? MMI_COLOUR_FAIL : MMI_COLOUR_TEXT;
+    int colour =
+        known && b.batteryLevel <= g_batteryWarningVolt ? MMI_COLOUR_FAIL : MMI_COLOUR_TEXT;
     std::string charging = tr(known && mmi_battery_is_charging(&b) ? "BatteryCharging_Charging"
                                                                    : "BatteryCharging_Null");
     std::lock_guard<std::mutex> lk(s_titleMutex);

@@ -1,5 +1,6 @@
-// The camera and light tests: the back, second back and front cameras and all the lights: stand-ins until each window exists.
-// An entry logs at error priority that its test is not available and opens nothing.
+// The camera and light tests: the back, second back and front cameras and all the lights: stand-ins
+// until each window exists. An entry logs at error priority that its test is not available and
+// opens nothing.
 #pragma once
 
 void *mmi_testwnd_CameraBackTestEntry(void);  // FTX_CAMERA_BACK

@@ -1,5 +1,5 @@
-// The card and peripheral tests: SIM, SD, both cards, USB host and NFC: stand-ins until each window exists.
-// An entry logs at error priority that its test is not available and opens nothing.
+// The card and peripheral tests: SIM, SD, both cards, USB host and NFC: stand-ins until each window
+// exists. An entry logs at error priority that its test is not available and opens nothing.
 #pragma once
 
 void *mmi_testwnd_SIMCardTestEntry(void);  // FTX_SIMCARD

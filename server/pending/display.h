@@ -1,5 +1,6 @@
-// The display tests: LCD colours, the auxiliary display hint and the preview's LCD colours: stand-ins until each window exists.
-// An entry logs at error priority that its test is not available and opens nothing.
+// The display tests: LCD colours, the auxiliary display hint and the preview's LCD colours:
+// stand-ins until each window exists. An entry logs at error priority that its test is not
+// available and opens nothing.
 #pragma once
 
 void *mmi_LCDColorTestEntry(void);  // FTX_LCD

@@ -1,5 +1,6 @@
-// The sensor tests: the sensor list, the hall sensors, the fingerprint reader and the SAR sensors: stand-ins until each window exists.
-// An entry logs at error priority that its test is not available and opens nothing.
+// The sensor tests: the sensor list, the hall sensors, the fingerprint reader and the SAR sensors:
+// stand-ins until each window exists. An entry logs at error priority that its test is not
+// available and opens nothing.
 #pragma once
 
 void *mmi_testwnd_SensorsTestEntry(void);  // FTX_SENSOR

@@ -1,5 +1,6 @@
-// The touch tests: the panel self-test and the touch screen, in a run and in the preview: stand-ins until each window exists.
-// An entry logs at error priority that its test is not available and opens nothing.
+// The touch tests: the panel self-test and the touch screen, in a run and in the preview: stand-ins
+// until each window exists. An entry logs at error priority that its test is not available and
+// opens nothing.
 #pragma once
 
 void *mmi_testwnd_TPSelfTest_Entry(void);  // FTX_TPSELF

@@ -23,7 +23,6 @@
 
 namespace {
 
-
 // GUI thread only, apart from the handle and the pending flag.
 std::atomic<HWND> s_window{HWND_INVALID};
 mmi_devicetest_row s_rows[MMI_DEVICETEST_MAX_ROWS];

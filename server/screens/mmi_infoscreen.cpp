@@ -19,7 +19,6 @@
 
 namespace {
 
-
 // GUI thread only, apart from the handle.
 std::atomic<HWND> s_window{HWND_INVALID};
 mmi_info_line s_lines[MMI_INFO_MAX_LINES];

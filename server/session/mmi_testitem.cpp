@@ -109,25 +109,24 @@ int Get_TestItem_Config(int reset) {
     if (reset & 1) g_pTestItemListHead = nullptr;
     g_testItemListCount = 0;
     const testitem_table &t = s_catalogue.load()->main;
-    return build_list(t.rows, t.count,
-                      {&g_pTestItemListHead, &g_testItemListCount}, BuildKind::Main, __func__);
+    return build_list(t.rows, t.count, {&g_pTestItemListHead, &g_testItemListCount},
+                      BuildKind::Main, __func__);
 }
 
 int Get_AuxLCD_TestItem_Config(int reset) {
     if (reset & 1) g_pTestItemListHead = nullptr;
     g_testItemListCount = 0;
     const testitem_table &t = s_catalogue.load()->auxLcd;
-    return build_list(t.rows, t.count,
-                      {&g_pTestItemListHead, &g_testItemListCount}, BuildKind::AuxLCD, __func__);
+    return build_list(t.rows, t.count, {&g_pTestItemListHead, &g_testItemListCount},
+                      BuildKind::AuxLCD, __func__);
 }
 
 int Get_MonomerPreviewTestItem_Config(void) {
     g_pMonomerPreviewListHead = nullptr;
     g_monomerPreviewListCount = 0;
     const testitem_table &t = s_catalogue.load()->monomer;
-    return build_list(t.rows, t.count,
-                      {&g_pMonomerPreviewListHead, &g_monomerPreviewListCount}, BuildKind::Monomer,
-                      __func__);
+    return build_list(t.rows, t.count, {&g_pMonomerPreviewListHead, &g_monomerPreviewListCount},
+                      BuildKind::Monomer, __func__);
 }
 
 int ftx_config_Get_TestItem_Config_Paras(const char *domain) {

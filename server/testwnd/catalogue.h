@@ -27,7 +27,8 @@ inline constexpr mmi_catalogue_row Hall2nd{"FTX_HALL_2ND", "menu_HallSensor", 35
 inline constexpr mmi_catalogue_row FingerPrint{"FTX_FINGERPRINT", "menu_FingerPrintTest", 336};
 inline constexpr mmi_catalogue_row Nfc{"FTX_NFC", "title_NfcTest", 340};
 inline constexpr mmi_catalogue_row CameraBack{"FTX_CAMERA_BACK", "title_MainCameraTest", 288};
-inline constexpr mmi_catalogue_row AuxCameraBack{"FTX_AUX_CAMERA_BACK", "title_MainCamera2Test", 288};
+inline constexpr mmi_catalogue_row AuxCameraBack{"FTX_AUX_CAMERA_BACK", "title_MainCamera2Test",
+                                                 288};
 inline constexpr mmi_catalogue_row CameraFront{"FTX_CAMERA_FRONT", "title_subCameraTest", 292};
 inline constexpr mmi_catalogue_row Lcd{"FTX_LCD", "menu_LCDTest", 280};
 inline constexpr mmi_catalogue_row AllLight{"FTX_ALLLIGHT", "menu_AllLightTest", 284};
@@ -40,20 +41,27 @@ inline constexpr mmi_catalogue_row Receiver{"FTX_RECEIVER", "menu_ReceiverRingTe
 inline constexpr mmi_catalogue_row HookKey{"FTX_HOOKKEY", "menu_HookKeyTest", -1};
 inline constexpr mmi_catalogue_row HeadsetLoopback{"FTX_HEADSET_LOOPBACK", "menu_HeadSetTest", 304};
 inline constexpr mmi_catalogue_row Fm{"FTX_FM", "menu_FMTest", 308};
-inline constexpr mmi_catalogue_row AudioMicHeadsetLoopback{"FTX_AUDIO_MIC_HEADSET_LOOPBACK", "menu_Mic_Headset", 136};
-inline constexpr mmi_catalogue_row AudioAuxMic1HeadsetLoopback{"FTX_AUDIO_AUXILIARYMIC1_HEADSET_LOOPBACK", "menu_AuxMic1_Headset", 140};
-inline constexpr mmi_catalogue_row AudioAuxMic2HeadsetLoopback{"FTX_AUDIO_AUXILIARYMIC2_HEADSET_LOOPBACK", "menu_AuxMic2_Headset", 142};
+inline constexpr mmi_catalogue_row AudioMicHeadsetLoopback{"FTX_AUDIO_MIC_HEADSET_LOOPBACK",
+                                                           "menu_Mic_Headset", 136};
+inline constexpr mmi_catalogue_row AudioAuxMic1HeadsetLoopback{
+    "FTX_AUDIO_AUXILIARYMIC1_HEADSET_LOOPBACK", "menu_AuxMic1_Headset", 140};
+inline constexpr mmi_catalogue_row AudioAuxMic2HeadsetLoopback{
+    "FTX_AUDIO_AUXILIARYMIC2_HEADSET_LOOPBACK", "menu_AuxMic2_Headset", 142};
 inline constexpr mmi_catalogue_row Hifi{"FTX_HIFI", "HIFI", 368};
-inline constexpr mmi_catalogue_row AudioHeadsetReceiverLoopback{"FTX_AUDIO_HEADSET_RECEIVER_LOOPBACK", "menu_Headset_Receiver", 144};
-inline constexpr mmi_catalogue_row AudioHeadsetSpeakerLoopback{"FTX_AUDIO_HEADSET_SPEAKER_LOOPBACK", "menu_Headset_Speaker", 148};
+inline constexpr mmi_catalogue_row AudioHeadsetReceiverLoopback{
+    "FTX_AUDIO_HEADSET_RECEIVER_LOOPBACK", "menu_Headset_Receiver", 144};
+inline constexpr mmi_catalogue_row AudioHeadsetSpeakerLoopback{"FTX_AUDIO_HEADSET_SPEAKER_LOOPBACK",
+                                                               "menu_Headset_Speaker", 148};
 inline constexpr mmi_catalogue_row Vibrator{"FTX_VIBRATOR", "menu_VibratorTest", 316};
 inline constexpr mmi_catalogue_row Sar{"FTX_SAR", "menuSARtest", 376};
 inline constexpr mmi_catalogue_row AuxiliarySar{"FTX_AuxiliarySAR", "AuxiSARSARtest", 376};
 inline constexpr mmi_catalogue_row Cards{"FTX_CARDS", "menu_AllCardTest", 324};
-inline constexpr mmi_catalogue_row MainMicRecord{"FTX_AUDIO_MAINMICRECORD", "title_MainMic_Record", -1};
+inline constexpr mmi_catalogue_row MainMicRecord{"FTX_AUDIO_MAINMICRECORD", "title_MainMic_Record",
+                                                 -1};
 inline constexpr mmi_catalogue_row AuxLcdHint{"FTX_AUXLCD_HINT", "title_AuxLcdTest", -1};
 inline constexpr mmi_catalogue_row AuxLcdRunTpSelf{"FTX_TPSELF", "title_TPSelfTest", 320};
-inline constexpr mmi_catalogue_row MonomerHardVersion{"FTX_MONOMER_HARDVERSION", "menu_NfcTest", -1};
+inline constexpr mmi_catalogue_row MonomerHardVersion{"FTX_MONOMER_HARDVERSION", "menu_NfcTest",
+                                                      -1};
 inline constexpr mmi_catalogue_row MonomerLcd{"FTX_MONOMER_LCD", "menu_LCDTest", -1};
 inline constexpr mmi_catalogue_row MonomerTouch{"FTX_TOUCH", "menu_TouchTest", -1};
 }  // namespace catalogue

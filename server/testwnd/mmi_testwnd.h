@@ -32,7 +32,8 @@ struct mmi_hw_named_op {
     const char *name;
     bool bound() const { return op != nullptr && *op != nullptr; }
 };
-#define MMI_HW_OP(slot) {&hw::slot, #slot}
+#define MMI_HW_OP(slot) \
+    { &hw::slot, #slot }
 typedef mmi_hw_named_op<int (*)(int)> mmi_hw_start_op;
 typedef mmi_hw_named_op<int (*)(void)> mmi_hw_stop_op;
 
@@ -52,19 +53,19 @@ struct mmi_testwnd_state {
 
 // A test family that follows the common pattern, written with designated initializers.
 struct mmi_testwnd_desc {
-    const mmi_catalogue_row *row;     // domain (also the log tag), result item, title key
-    const char *caption;              // window caption
-    const char *titleKey = nullptr;   // title strip and title control, when not the row's
-    const char *noteKey = "";         // body text
-    int foolProofSeconds = 0;         // before the pass label shows
-    mmi_hw_start_op start = {};       // hardware start, given the mode variable
+    const mmi_catalogue_row *row;    // domain (also the log tag), result item, title key
+    const char *caption;             // window caption
+    const char *titleKey = nullptr;  // title strip and title control, when not the row's
+    const char *noteKey = "";        // body text
+    int foolProofSeconds = 0;        // before the pass label shows
+    mmi_hw_start_op start = {};      // hardware start, given the mode variable
     mmi_hw_stop_op stop = {};
-    int stopEntrySleepMs = 0;         // after the stop entry closed the window
-    int pcStopSleepMs = 0;            // after the PC stop entry
+    int stopEntrySleepMs = 0;  // after the stop entry closed the window
+    int pcStopSleepMs = 0;     // after the PC stop entry
     mmi_testwnd_state *state = nullptr;
-    int (*stopEntry)(void) = nullptr;  // closes the window from outside
-    int run = MMI_RUN_AUTO;            // the run a pass or fail is reported to
-    int (*bind)(void) = nullptr;       // per-feature binder, null when none
+    int (*stopEntry)(void) = nullptr;                      // closes the window from outside
+    int run = MMI_RUN_AUTO;                                // the run a pass or fail is reported to
+    int (*bind)(void) = nullptr;                           // per-feature binder, null when none
     void (*note)(char *out, unsigned int size) = nullptr;  // body text instead of noteKey
 };
 

@@ -72,10 +72,12 @@ TEST(IncludeRules, IncludesDownwardAndWithinTheirAreaPass) {
            "#include \"session/mmi_runstate.h\"\n#include \"core/ftx_config.h\"\n");
     t.file("server/testwnd/misc/mmi_testwnd_vibrator.cpp",
            "#include \"mmi_testwnd_vibrator.h\"\n#include \"testwnd/mmi_testwnd.h\"\n");
-    t.file("server/testwnd/catalogue.cpp", "#include \"testwnd/audio/mmi_testwnd_ring.h\"\n"
-                                           "#include \"testwnd/misc/mmi_testwnd_vibrator.h\"\n");
-    t.file("server/adbd_connection/handlers/misc.cpp",
-           "#include \"testwnd/misc/mmi_testwnd_vibrator.h\"\n#include \"session/mmi_autotest.h\"\n");
+    t.file("server/testwnd/catalogue.cpp",
+           "#include \"testwnd/audio/mmi_testwnd_ring.h\"\n"
+           "#include \"testwnd/misc/mmi_testwnd_vibrator.h\"\n");
+    t.file(
+        "server/adbd_connection/handlers/misc.cpp",
+        "#include \"testwnd/misc/mmi_testwnd_vibrator.h\"\n#include \"session/mmi_autotest.h\"\n");
     EXPECT_TRUE(t.check().empty()) << joined(t.check());
 }
 

@@ -18,7 +18,8 @@
 namespace {
 
 // The sequence and the preview receive what their windows report, as after start-up.
-[[maybe_unused]] const bool kRunsInstalled = (mmi_autotest_install_run(), mmi_monomer_install_run(), true);
+[[maybe_unused]] const bool kRunsInstalled =
+    (mmi_autotest_install_run(), mmi_monomer_install_run(), true);
 
 struct Flags {
     const char *domain;
