@@ -1,5 +1,6 @@
 // The factory library's hardware model: callbacks it was given, the state the console sets,
-// and the events it sends back from its worker thread.
+// and the events it sends back from its worker thread. The members are defined with the area
+// they model (factory_audio.cpp, factory_touch.cpp...) or, for the callbacks, in the core.
 #pragma once
 
 #include <stddef.h>
