@@ -7,12 +7,15 @@
 #include <stdlib.h>
 
 #include <map>
+#include <set>
 #include <string>
 
 #include <gtest/gtest.h>
 
 #include "adbd_connection/AtCmdTable.h"
 #include "adbd_connection/CmdParse.h"
+#include "adbd_connection/handlers/handlers.h"
+#include "support/host_io.h"
 #include "support/temp_root.h"
 
 namespace {
@@ -260,3 +263,46 @@ TEST(CommandTable, StartUpRegistersTheRowsInTableOrder) {
 }
 
 }  // namespace
+
+namespace {
+
+// The functions the application library defines, by plain name.
+std::set<std::string> defined_functions() {
+    int status = -1;
+    std::string out = run("nm -C --defined-only '" FTX_APP_ARCHIVE "' 2>/dev/null", &status);
+    std::set<std::string> names;
+    size_t pos = 0;
+    while (pos < out.size()) {
+        size_t end = out.find('\n', pos);
+        if (end == std::string::npos) end = out.size();
+        std::string line = out.substr(pos, end - pos);
+        pos = end + 1;
+        size_t t = line.find(" T ");
+        if (t == std::string::npos) continue;
+        std::string name = line.substr(t + 3);
+        names.insert(name.substr(0, name.find('(')));
+    }
+    return names;
+}
+
+}  // namespace
+
+// A family that lands defines its handlers and takes its rows out of pending: a row still
+// pending must name a function that does not exist yet, and every name is declared once.
+TEST(CommandTable, PendingRowsNameHandlersThatDoNotExistYet) {
+    std::set<std::string> defined = defined_functions();
+    ASSERT_GT(defined.count("AutoTest_Vibrator_Start"), 0u) << "nm found no handlers";
+#define AT_NAME(name) #name,
+    const std::set<std::string> declared = {AT_HANDLERS(AT_NAME)};
+#undef AT_NAME
+    for (int i = 0; i < AT_CMD_TABLE_ROWS; i++) {
+        const std::string handler = kRows[i].handler;
+        SCOPED_TRACE("row " + std::to_string(i + 1) + " " + handler);
+        if (handler != "AutoCloseDialog") {
+            EXPECT_EQ(1u, declared.count(handler));
+        }
+        if (g_atcmd_table[i].fun == nullptr) {
+            EXPECT_EQ(0u, defined.count(handler));
+        }
+    }
+}
