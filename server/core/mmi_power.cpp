@@ -153,13 +153,11 @@ void power_off_idle() {
 }  // namespace
 
 mmi_power_ops mmi_power_default_ops(void) {
-    mmi_power_ops ops{};
-    ops.clock_us = mmi_power_clock_us;
-    ops.write_file = write_file;
-    ops.shell = shell_run;
-    ops.power_off = power_off_now;
-    ops.title_show = no_title;
-    return ops;
+    return {.clock_us = mmi_power_clock_us,
+            .write_file = write_file,
+            .shell = shell_run,
+            .power_off = power_off_now,
+            .title_show = no_title};
 }
 
 mmi_power_ops g_powerOps = mmi_power_default_ops();

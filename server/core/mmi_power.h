@@ -23,10 +23,10 @@ struct mmi_power_ops {
     int (*shell)(const char *cmd);
     void (*power_off)(void);  // sync and the power-off reboot; does not return on a handset
     int (*title_show)(const char *text, int index, int abnormalState);
-    int (*mode_uninit)(void);
-    int (*vibrator_start)(int ms);
-    int (*lcd_refresh)(int arg);
-    int (*unregister_observer)(int kind, FTX_BatteryObserver_cb cb);
+    int (*mode_uninit)(void) = nullptr;
+    int (*vibrator_start)(int ms) = nullptr;
+    int (*lcd_refresh)(int arg) = nullptr;
+    int (*unregister_observer)(int kind, FTX_BatteryObserver_cb cb) = nullptr;
 };
 // The operations in force; mmi_power_default_ops() gives the process's own.
 extern mmi_power_ops g_powerOps;

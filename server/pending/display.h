@@ -1,11 +1,16 @@
-// The display tests: LCD colours, the auxiliary display hint and the preview's LCD colours:
-// stand-ins until each window exists. An entry logs at error priority that its test is not
-// available and opens nothing.
+// Stand-ins for the display tests (LCD colours, the auxiliary display hint, the preview's LCD
+// colours) until each window exists. An entry logs at error priority that its test is not
+// available and opens nothing; a family that lands takes its lines out of this list.
 #pragma once
 
-void *mmi_LCDColorTestEntry(void);  // FTX_LCD
-int mmi_LCDColorTest_Stop_Entry(void);
-void *mmi_testwnd_AuxLCDHintTestEntry(void);  // FTX_AUXLCD_HINT
-int mmi_testwnd_AuxLCDHintStop_Entry(void);
-void *mmi_Monomer_LCDColorTestEntry(void);  // FTX_MONOMER_LCD
-int mmi_Monomer_LCDColorTest_Stop_Entry(void);
+#include "pending/pending.h"
+
+#define MMI_PENDING_DISPLAY(ENTRY, STOP)                      \
+    ENTRY(mmi_LCDColorTestEntry, "FTX_LCD")                   \
+    STOP(mmi_LCDColorTest_Stop_Entry, "FTX_LCD")              \
+    ENTRY(mmi_testwnd_AuxLCDHintTestEntry, "FTX_AUXLCD_HINT") \
+    STOP(mmi_testwnd_AuxLCDHintStop_Entry, "FTX_AUXLCD_HINT") \
+    ENTRY(mmi_Monomer_LCDColorTestEntry, "FTX_MONOMER_LCD")   \
+    STOP(mmi_Monomer_LCDColorTest_Stop_Entry, "FTX_MONOMER_LCD")
+
+MMI_PENDING_DISPLAY(MMI_DECLARE_ENTRY, MMI_DECLARE_STOP)

@@ -1,9 +1,4 @@
 // Stand-ins of the keys tests.
 #include "pending/keys.h"
 
-#include "pending/pending.h"
-
-MMI_PENDING_ENTRY(mmi_teswnd_KeyTestEntry, "FTX_KEYS")
-MMI_PENDING_STOP(mmi_teswnd_KeyTest_Stop_Entry, "FTX_KEYS")
-MMI_PENDING_ENTRY(mmi_teswnd_HookKeyTestEntry, "FTX_HOOKKEY")
-MMI_PENDING_STOP(mmi_teswnd_HookKeyTest_Stop_Entry, "FTX_HOOKKEY")
+MMI_PENDING_KEYS(MMI_PENDING_ENTRY, MMI_PENDING_STOP)

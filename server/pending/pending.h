@@ -23,3 +23,7 @@
         __android_log_print(ANDROID_LOG_ERROR, tag, "%s: test not available yet", #fn); \
         return 0;                                                                       \
     }
+
+// Their declarations, from the same per-area lists.
+#define MMI_DECLARE_ENTRY(fn, tag) void *fn(void);
+#define MMI_DECLARE_STOP(fn, tag) int fn(void);

@@ -1,16 +1,21 @@
-// The sensor tests: the sensor list, the hall sensors, the fingerprint reader and the SAR sensors:
-// stand-ins until each window exists. An entry logs at error priority that its test is not
-// available and opens nothing.
+// Stand-ins for the sensor tests (the sensor list, the hall sensors, the fingerprint reader, SAR)
+// until each window exists. An entry logs at error priority that its test is not available and
+// opens nothing; a family that lands takes its lines out of this list.
 #pragma once
 
-void *mmi_testwnd_SensorsTestEntry(void);  // FTX_SENSOR
-int mmi_testwnd_SensorsTest_Stop_Entry(void);
-void *mmi_testwnd_HallSensorTestEntry(void);  // FTX_HALLSENSOR
-int mmi_testwnd_HallSensorTest_Stop_Entry(void);
-void *mmi_testwnd_HallTest_2nd_TestEntry(void);  // FTX_HALL_2ND
-int mmi_testwnd_HallTest_2nd_Stop_Entry(void);
-void *mmi_testwnd_FingerPrintTestEntry(void);  // FTX_FINGERPRINT
-int mmi_testwnd_FingerPrintTest_Stop_Entry(void);
-void *mmi_testwnd_sar_start(void);  // FTX_SAR
-int mmi_testwnd_sar_stop(void);
-void *mmi_testwnd_Auxiliarysar_start(void);  // FTX_AuxiliarySAR
+#include "pending/pending.h"
+
+#define MMI_PENDING_SENSORS(ENTRY, STOP)                            \
+    ENTRY(mmi_testwnd_SensorsTestEntry, "FTX_SENSOR")               \
+    STOP(mmi_testwnd_SensorsTest_Stop_Entry, "FTX_SENSOR")          \
+    ENTRY(mmi_testwnd_HallSensorTestEntry, "FTX_HALLSENSOR")        \
+    STOP(mmi_testwnd_HallSensorTest_Stop_Entry, "FTX_HALLSENSOR")   \
+    ENTRY(mmi_testwnd_HallTest_2nd_TestEntry, "FTX_HALL_2ND")       \
+    STOP(mmi_testwnd_HallTest_2nd_Stop_Entry, "FTX_HALL_2ND")       \
+    ENTRY(mmi_testwnd_FingerPrintTestEntry, "FTX_FINGERPRINT")      \
+    STOP(mmi_testwnd_FingerPrintTest_Stop_Entry, "FTX_FINGERPRINT") \
+    ENTRY(mmi_testwnd_sar_start, "FTX_SAR")                         \
+    STOP(mmi_testwnd_sar_stop, "FTX_SAR")                           \
+    ENTRY(mmi_testwnd_Auxiliarysar_start, "FTX_AuxiliarySAR")
+
+MMI_PENDING_SENSORS(MMI_DECLARE_ENTRY, MMI_DECLARE_STOP)

@@ -47,20 +47,18 @@ void exit_default(int status) {
 }  // namespace
 
 mmi_autotest_ops mmi_autotest_default_ops(void) {
-    mmi_autotest_ops ops;
-    ops.write_result = mmi_write_testinfo_single_byte;
-    ops.read_flags = read_flags_default;
-    ops.read_config = Read_MainCfgFile;
-    ops.modify_config = mmi_AutoTest_Modify_ConfigFile;
-    ops.build_list = Get_TestItem_Config;
-    ops.build_aux_list = Get_AuxLCD_TestItem_Config;
-    ops.open_device_list = no_device_list;
-    ops.device_list_is_open = no_device_list;
-    ops.refresh_device_list = no_refresh;
-    ops.lcd_off = lcd_off_default;
-    ops.exit_process = exit_default;
-    ops.sleep_us = tp_os_usleep;
-    return ops;
+    return {.write_result = mmi_write_testinfo_single_byte,
+            .read_flags = read_flags_default,
+            .read_config = Read_MainCfgFile,
+            .modify_config = mmi_AutoTest_Modify_ConfigFile,
+            .build_list = Get_TestItem_Config,
+            .build_aux_list = Get_AuxLCD_TestItem_Config,
+            .open_device_list = no_device_list,
+            .device_list_is_open = no_device_list,
+            .refresh_device_list = no_refresh,
+            .lcd_off = lcd_off_default,
+            .exit_process = exit_default,
+            .sleep_us = tp_os_usleep};
 }
 
 mmi_autotest_ops g_autotestOps = mmi_autotest_default_ops();

@@ -103,22 +103,21 @@ int build_list(testitem *table, int rows, const ItemList &list, BuildKind kind, 
     return 0;
 }
 
+// The main and the auxiliary-LCD builds share one list.
+int build_run_list(int reset, const testitem_table &t, BuildKind kind, const char *who) {
+    if (reset & 1) g_pTestItemListHead = nullptr;
+    g_testItemListCount = 0;
+    return build_list(t.rows, t.count, {&g_pTestItemListHead, &g_testItemListCount}, kind, who);
+}
+
 }  // namespace
 
 int Get_TestItem_Config(int reset) {
-    if (reset & 1) g_pTestItemListHead = nullptr;
-    g_testItemListCount = 0;
-    const testitem_table &t = s_catalogue.load()->main;
-    return build_list(t.rows, t.count, {&g_pTestItemListHead, &g_testItemListCount},
-                      BuildKind::Main, __func__);
+    return build_run_list(reset, s_catalogue.load()->main, BuildKind::Main, __func__);
 }
 
 int Get_AuxLCD_TestItem_Config(int reset) {
-    if (reset & 1) g_pTestItemListHead = nullptr;
-    g_testItemListCount = 0;
-    const testitem_table &t = s_catalogue.load()->auxLcd;
-    return build_list(t.rows, t.count, {&g_pTestItemListHead, &g_testItemListCount},
-                      BuildKind::AuxLCD, __func__);
+    return build_run_list(reset, s_catalogue.load()->auxLcd, BuildKind::AuxLCD, __func__);
 }
 
 int Get_MonomerPreviewTestItem_Config(void) {

@@ -113,13 +113,25 @@ long get_value(const char *key, long def) {
     return it != g_values.end() ? it->second : def;
 }
 
-void Reply::add(const char *fmt, ...) {
+void Reply::vadd(const char *fmt, va_list ap) {
     if (buf_ == nullptr || size_ == 0 || len_ + 1 >= size_) return;
+    int n = vsnprintf(buf_ + len_, size_ - len_, fmt, ap);
+    if (n > 0) len_ = (len_ + n < size_) ? len_ + n : size_ - 1;
+}
+
+void Reply::add(const char *fmt, ...) {
     va_list ap;
     va_start(ap, fmt);
-    int n = vsnprintf(buf_ + len_, size_ - len_, fmt, ap);
+    vadd(fmt, ap);
     va_end(ap);
-    if (n > 0) len_ = (len_ + n < size_) ? len_ + n : size_ - 1;
+}
+
+int Reply::done(const char *fmt, ...) {
+    va_list ap;
+    va_start(ap, fmt);
+    vadd(fmt, ap);
+    va_end(ap);
+    return 0;
 }
 
 void add_words(const Word *words, size_t count, void (*state)(Reply &)) {

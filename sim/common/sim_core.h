@@ -3,6 +3,7 @@
 // and the worker thread that delivers callbacks the way a handset's library does.
 #pragma once
 
+#include <stdarg.h>
 #include <stddef.h>
 
 #include <functional>
@@ -33,9 +34,12 @@ class Reply {
         if (buf_ != nullptr && size_ > 0) buf_[0] = '\0';
     }
     void add(const char *fmt, ...) __attribute__((format(printf, 2, 3)));
+    // Adds the word's last line and returns 0, what a word that is done returns.
+    int done(const char *fmt, ...) __attribute__((format(printf, 2, 3)));
     size_t length() const { return len_; }
 
   private:
+    void vadd(const char *fmt, va_list ap);
     char *buf_;
     size_t size_;
     size_t len_ = 0;

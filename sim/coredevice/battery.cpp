@@ -148,8 +148,7 @@ int battery_word(const Args &a, Reply &r) {
     } else {
         return 1;
     }
-    r.add("battery %s %s\n", a[1].c_str(), a[2].c_str());
-    return 0;
+    return r.done("battery %s %s\n", a[1].c_str(), a[2].c_str());
 }
 
 int charger_word(const Args &a, Reply &r) {
@@ -176,9 +175,8 @@ int charger_word(const Args &a, Reply &r) {
         return 1;
     }
     b.cv.notify_all();
-    r.add("charger: ac=%d usb=%d wireless=%d\n", i.chargerAcOnline, i.chargerUsbOnline,
-          i.chargerWirelessOnline);
-    return 0;
+    return r.done("charger: ac=%d usb=%d wireless=%d\n", i.chargerAcOnline, i.chargerUsbOnline,
+                  i.chargerWirelessOnline);
 }
 
 }  // namespace ftxsim

@@ -14,8 +14,7 @@ std::atomic<bool> g_linkFails{false};
 int wifilink_word(const Args &a, Reply &r) {
     if (a.size() != 2 || (a[1] != "ok" && a[1] != "fail")) return 1;
     g_linkFails.store(a[1] == "fail");
-    r.add("wifilink switch %s\n", a[1].c_str());
-    return 0;
+    return r.done("wifilink switch %s\n", a[1].c_str());
 }
 
 void state(Reply &r) {

@@ -65,8 +65,7 @@ int w_headset(const Args &a, Reply &r) {
         audio().headset = static_cast<int>(v);
     }
     model().send_headset();
-    r.add("headset %ld\n", v);
-    return 0;
+    return r.done("headset %ld\n", v);
 }
 
 int w_hook(const Args &a, Reply &r) {
@@ -86,8 +85,7 @@ int w_hook(const Args &a, Reply &r) {
         unsigned int s = status;
         cb(&s);
     });
-    r.add("hook %s\n", a[1].c_str());
-    return 0;
+    return r.done("hook %s\n", a[1].c_str());
 }
 
 }  // namespace

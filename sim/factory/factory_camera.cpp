@@ -39,17 +39,13 @@ int w_camera(const Args &a, Reply &r) {
     } else {
         camera().cameraFail |= 1u << id;
     }
-    r.add("camera %ld %s\n", id, ok ? "ok" : "fail");
-    return 0;
+    return r.done("camera %ld %s\n", id, ok ? "ok" : "fail");
 }
 
 }  // namespace
 
 constinit const Area kCameraArea = {
-    .words =
-        {
-            {"camera", "ID ok|fail", w_camera},
-        },
+    .words = {{"camera", "ID ok|fail", w_camera}},
     .state = state,
 };
 

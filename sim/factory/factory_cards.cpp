@@ -54,17 +54,13 @@ int w_card(const Args &a, Reply &r) {
     } else {
         return 1;
     }
-    r.add("card %s %ld %ld\n", a[1].c_str(), slot, present);
-    return 0;
+    return r.done("card %s %ld %ld\n", a[1].c_str(), slot, present);
 }
 
 }  // namespace
 
 constinit const Area kCardsArea = {
-    .words =
-        {
-            {"card", "sim SLOT 0|1 | sd 0 0|1", w_card},
-        },
+    .words = {{"card", "sim SLOT 0|1 | sd 0 0|1", w_card}},
     .reply = reply,
     .state = state,
 };

@@ -31,17 +31,13 @@ int w_firmware(const Args &a, Reply &r) {
     if (a.size() < 2) return 1;
     std::lock_guard<std::mutex> lock(model_lock());
     panel_firmware().firmware = rest(a, 1);
-    r.add("firmware set\n");
-    return 0;
+    return r.done("firmware set\n");
 }
 
 }  // namespace
 
 constinit const Area kFirmwareArea = {
-    .words =
-        {
-            {"firmware", "TEXT", w_firmware},
-        },
+    .words = {{"firmware", "TEXT", w_firmware}},
 };
 
 }  // namespace ftxsim

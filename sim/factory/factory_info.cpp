@@ -51,17 +51,13 @@ int w_testinfo(const Args &a, Reply &r) {
     if (a.size() != 2 || !on_off(a[1], &on)) return 1;
     std::lock_guard<std::mutex> lock(model_lock());
     info().testinfo = on;
-    r.add("testinfo %s\n", on ? "on" : "off");
-    return 0;
+    return r.done("testinfo %s\n", on ? "on" : "off");
 }
 
 }  // namespace
 
 constinit const Area kInfoArea = {
-    .words =
-        {
-            {"testinfo", "on|off  (off: the test information never arrives)", w_testinfo},
-        },
+    .words = {{"testinfo", "on|off  (off: the test information never arrives)", w_testinfo}},
     .state = state,
 };
 

@@ -39,8 +39,7 @@ int w_set(const Args &a, Reply &r) {
     } else {
         return 1;
     }
-    r.add("%s answers %s\n", a[1].c_str(), a[2].c_str());
-    return 0;
+    return r.done("%s answers %s\n", a[1].c_str(), a[2].c_str());
 }
 
 int w_reply(const Args &a, Reply &r) {
@@ -55,8 +54,7 @@ int w_reply(const Args &a, Reply &r) {
         if (!to_int(a[2], &dt)) return 1;
         st().replies[a[1]] = Event{static_cast<int>(dt), rest(a, 3)};
     }
-    r.add("%s replies %s\n", a[1].c_str(), a[2].c_str());
-    return 0;
+    return r.done("%s replies %s\n", a[1].c_str(), a[2].c_str());
 }
 
 int w_send(const Args &a, Reply &r) {
@@ -68,8 +66,7 @@ int w_send(const Args &a, Reply &r) {
         return 1;
     }
     deliver(cb, static_cast<int>(dt), rest(a, 3), a.size() > 3);
-    r.add("sent %ld to %s\n", dt, a[1].c_str());
-    return 0;
+    return r.done("sent %ld to %s\n", dt, a[1].c_str());
 }
 
 int w_flags(const Args &a, Reply &r) {
@@ -88,16 +85,14 @@ int w_flags(const Args &a, Reply &r) {
     if (a.size() == 2 && a[1] == "clear") {
         memset(f, 0, sizeof(f));
         if (flags_store(f) != 0) return r.add("cannot write the flag area"), 1;
-        r.add("flags cleared\n");
-        return 0;
+        return r.done("flags cleared\n");
     }
     if (a.size() == 4 && a[1] == "set" && to_int(a[2], &i) && to_int(a[3], &v) && i >= 0 &&
         i < FTX_TESTINFO_FLAGS_SIZE && v >= 0 && v <= 255) {
         if (flags_write_byte(static_cast<int>(i), static_cast<unsigned char>(v)) != 0) {
             return r.add("cannot write the flag area"), 1;
         }
-        r.add("byte %ld = 0x%02lx\n", i, v);
-        return 0;
+        return r.done("byte %ld = 0x%02lx\n", i, v);
     }
     if ((a.size() == 3 || a.size() == 4) && a[1] == "item" && to_int(a[2], &i) && i >= 0 &&
         i < 400) {
@@ -111,8 +106,7 @@ int w_flags(const Args &a, Reply &r) {
             }
         }
         flags_load(f);
-        r.add("item %ld = %d\n", i, (f[i / 4] >> shift) & 3);
-        return 0;
+        return r.done("item %ld = %d\n", i, (f[i / 4] >> shift) & 3);
     }
     return 1;
 }

@@ -40,17 +40,13 @@ int w_detect(const Args &a, Reply &r) {
     }
     std::lock_guard<std::mutex> lock(model_lock());
     radio().detect[a[1]] = ok ? 0 : -1;
-    r.add("detect %s %s\n", a[1].c_str(), ok ? "ok" : "fail");
-    return 0;
+    return r.done("detect %s %s\n", a[1].c_str(), ok ? "ok" : "fail");
 }
 
 }  // namespace
 
 constinit const Area kRadioArea = {
-    .words =
-        {
-            {"detect", "bt|fm|wifi ok|fail", w_detect},
-        },
+    .words = {{"detect", "bt|fm|wifi ok|fail", w_detect}},
     .reply = reply,
 };
 

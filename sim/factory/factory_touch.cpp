@@ -68,17 +68,13 @@ int w_tp(const Args &a, Reply &r) {
     } else {
         return 1;
     }
-    r.add("tp %s %ld\n", a[1].c_str(), v);
-    return 0;
+    return r.done("tp %s %ld\n", a[1].c_str(), v);
 }
 
 }  // namespace
 
 constinit const Area kTouchArea = {
-    .words =
-        {
-            {"tp", "verdict N [x,y,num,px,py,...] | status 0..3 | delay MS", w_tp},
-        },
+    .words = {{"tp", "verdict N [x,y,num,px,py,...] | status 0..3 | delay MS", w_tp}},
     .state = state,
 };
 

@@ -51,8 +51,7 @@ int modem_word(const Args &a, Reply &r) {
     } else {
         return 1;
     }
-    r.add("modem %s %s\n", a[1].c_str(), a[2].c_str());
-    return 0;
+    return r.done("modem %s %s\n", a[1].c_str(), a[2].c_str());
 }
 
 void state(Reply &r) {

@@ -271,16 +271,10 @@ std::set<std::string> defined_functions() {
     int status = -1;
     std::string out = run("nm -C --defined-only '" FTX_APP_ARCHIVE "' 2>/dev/null", &status);
     std::set<std::string> names;
-    size_t pos = 0;
-    while (pos < out.size()) {
-        size_t end = out.find('\n', pos);
-        if (end == std::string::npos) end = out.size();
-        std::string line = out.substr(pos, end - pos);
-        pos = end + 1;
-        size_t t = line.find(" T ");
-        if (t == std::string::npos) continue;
-        std::string name = line.substr(t + 3);
-        names.insert(name.substr(0, name.find('(')));
+    // "<address> T <name>(<arguments>)" for each function the archive's objects define.
+    for (size_t t = out.find(" T "); t != std::string::npos; t = out.find(" T ", t + 3)) {
+        size_t end = out.find_first_of("(\n", t + 3);
+        names.insert(out.substr(t + 3, end == std::string::npos ? end : end - t - 3));
     }
     return names;
 }
