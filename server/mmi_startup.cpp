@@ -4,7 +4,7 @@
 #include "core/ftx_lib_binding.h"
 #include "core/mmi_power.h"
 #include "core/mmi_settings.h"
-#include "hub/mmi_mainwnd.h"
+#include "hub/mmi_titlestrip.h"
 #include "screens/mmi_devicetest.h"
 #include "session/mmi_autotest.h"
 #include "session/mmi_monomer.h"

@@ -1,6 +1,7 @@
 // Geometry, fonts and the power key's threshold of the main window, from the screen size.
 #include <gtest/gtest.h>
 
+#include "hub/mmi_hub_keys.h"
 #include "hub/mmi_mainwnd.h"
 #include "mmi_theme.h"
 
