@@ -251,36 +251,93 @@ void sv_delete(HWND h, ScrollView *sv, int idx) {
     sv->pressed = -1;
 }
 
-LRESULT sv_message(HWND h, ScrollView *sv, UINT msg, WPARAM wp, LPARAM lp) {
+// Inserts an item where info asks (or in sort order); its position, or -1 when the item's
+// init callback refused it.
+LRESULT sv_add_item(HWND h, ScrollView *sv, WPARAM wp, LPARAM lp) {
+    int count = static_cast<int>(sv->items.size());
+    const SVITEMINFO *info = reinterpret_cast<const SVITEMINFO *>(lp);
+    auto *it = new SvItem;
+    if (info != nullptr) {
+        it->height = info->nItemHeight > 0 ? info->nItemHeight : 16;
+        it->addData = info->addData;
+    }
+    int pos = info != nullptr && info->nItem >= 0 && info->nItem < count ? info->nItem : count;
+    if (sv->cmp != nullptr && (GetWindowStyle(h) & SVS_AUTOSORT) != 0) {
+        pos = 0;
+        while (pos < count && sv->cmp(sv->items[static_cast<size_t>(pos)], it) <= 0)
+            pos++;
+    }
+    sv->items.insert(sv->items.begin() + pos, it);
+    if (sv->ops.initItem != nullptr && sv->ops.initItem(h, it) == -1) {
+        sv->items.erase(sv->items.begin() + pos);
+        delete it;
+        return -1;
+    }
+    if (sv->cur >= pos) sv->cur++;
+    if (wp != 0) *reinterpret_cast<HSVITEM *>(wp) = it;
+    InvalidateRect(h, nullptr, TRUE);
+    return pos;
+}
+
+// Sorts the items by cmp (or the control's own), keeping the current item current.
+LRESULT sv_sort(HWND h, ScrollView *sv, LPARAM lp) {
+    auto cmp = reinterpret_cast<SVITEM_CMP>(lp);
+    if (cmp == nullptr) cmp = sv->cmp;
+    if (cmp == nullptr) return 0;
+    SvItem *cur = sv->cur >= 0 ? sv->items[static_cast<size_t>(sv->cur)] : nullptr;
+    std::stable_sort(sv->items.begin(), sv->items.end(),
+                     [cmp](SvItem *a, SvItem *b) { return cmp(a, b) < 0; });
+    sv->cur = cur != nullptr ? sv_index(sv, reinterpret_cast<WPARAM>(cur)) : -1;
+    InvalidateRect(h, nullptr, TRUE);
+    return 0;
+}
+
+// The content and view geometry messages.
+LRESULT sv_geometry(HWND h, ScrollView *sv, UINT msg, LPARAM lp) {
     RECT rc;
     GetClientRect(h, &rc);
+    switch (msg) {
+        case SVM_GETFIRSTVISIBLEITEM:
+            return sv_hit(sv, 0);
+        case SVM_GETCONTENTY:
+        case SVM_GETVSCROLLVAL:
+            return sv->top;
+        case SVM_GETCONTENTX:
+        case SVM_GETHSCROLLVAL:
+        case SVM_GETLEFTMARGIN:
+        case SVM_GETTOPMARGIN:
+        case SVM_GETRIGHTMARGIN:
+        case SVM_GETBOTTOMMARGIN:
+            return 0;
+        case SVM_SETCONTPOS:
+        case SVM_MAKEPOSVISIBLE:
+            if (static_cast<long>(lp) >= 0) {
+                sv->top = std::max(0, std::min(static_cast<int>(lp),
+                                               std::max(0, sv_content_height(sv) - RECTH(rc))));
+                InvalidateRect(h, nullptr, TRUE);
+            }
+            return 0;
+        case SVM_GETVISIBLEWIDTH:
+        case SVM_GETCONTWIDTH:
+            return RECTW(rc);
+        case SVM_GETVISIBLEHEIGHT:
+        case SVM_GETVSCROLLPAGEVAL:
+            return RECTH(rc);
+        case SVM_GETCONTHEIGHT:
+            return sv_content_height(sv);
+        case SVM_GETMARGINS:
+            if (lp != 0) SetRectEmpty(reinterpret_cast<RECT *>(lp));
+            return 0;
+        default:
+            return 0;
+    }
+}
+
+LRESULT sv_message(HWND h, ScrollView *sv, UINT msg, WPARAM wp, LPARAM lp) {
     int count = static_cast<int>(sv->items.size());
     switch (msg) {
-        case SVM_ADDITEM: {
-            const SVITEMINFO *info = reinterpret_cast<const SVITEMINFO *>(lp);
-            auto *it = new SvItem;
-            if (info != nullptr) {
-                it->height = info->nItemHeight > 0 ? info->nItemHeight : 16;
-                it->addData = info->addData;
-            }
-            int pos =
-                info != nullptr && info->nItem >= 0 && info->nItem < count ? info->nItem : count;
-            if (sv->cmp != nullptr && (GetWindowStyle(h) & SVS_AUTOSORT) != 0) {
-                pos = 0;
-                while (pos < count && sv->cmp(sv->items[static_cast<size_t>(pos)], it) <= 0)
-                    pos++;
-            }
-            sv->items.insert(sv->items.begin() + pos, it);
-            if (sv->ops.initItem != nullptr && sv->ops.initItem(h, it) == -1) {
-                sv->items.erase(sv->items.begin() + pos);
-                delete it;
-                return -1;
-            }
-            if (sv->cur >= pos) sv->cur++;
-            if (wp != 0) *reinterpret_cast<HSVITEM *>(wp) = it;
-            InvalidateRect(h, nullptr, TRUE);
-            return pos;
-        }
+        case SVM_ADDITEM:
+            return sv_add_item(h, sv, wp, lp);
         case SVM_DELITEM: {
             int idx = sv_resolve(sv, wp);
             if (idx < 0) return -1;
@@ -317,17 +374,8 @@ LRESULT sv_message(HWND h, ScrollView *sv, UINT msg, WPARAM wp, LPARAM lp) {
             sv->cmp = reinterpret_cast<SVITEM_CMP>(lp);
             return reinterpret_cast<LRESULT>(old);
         }
-        case SVM_SORTITEMS: {
-            auto cmp = reinterpret_cast<SVITEM_CMP>(lp);
-            if (cmp == nullptr) cmp = sv->cmp;
-            if (cmp == nullptr) return 0;
-            SvItem *cur = sv->cur >= 0 ? sv->items[static_cast<size_t>(sv->cur)] : nullptr;
-            std::stable_sort(sv->items.begin(), sv->items.end(),
-                             [cmp](SvItem *a, SvItem *b) { return cmp(a, b) < 0; });
-            sv->cur = cur != nullptr ? sv_index(sv, reinterpret_cast<WPARAM>(cur)) : -1;
-            InvalidateRect(h, nullptr, TRUE);
-            return 0;
-        }
+        case SVM_SORTITEMS:
+            return sv_sort(h, sv, lp);
         case SVM_GETCURSEL:
             return sv->cur;
         case SVM_SETCURSEL:
@@ -369,39 +417,8 @@ LRESULT sv_message(HWND h, ScrollView *sv, UINT msg, WPARAM wp, LPARAM lp) {
             sv->items[wp]->height = lp > 0 ? static_cast<int>(lp) : 16;
             InvalidateRect(h, nullptr, TRUE);
             return 0;
-        case SVM_GETFIRSTVISIBLEITEM:
-            return sv_hit(sv, 0);
-        case SVM_GETCONTENTY:
-        case SVM_GETVSCROLLVAL:
-            return sv->top;
-        case SVM_GETCONTENTX:
-        case SVM_GETHSCROLLVAL:
-        case SVM_GETLEFTMARGIN:
-        case SVM_GETTOPMARGIN:
-        case SVM_GETRIGHTMARGIN:
-        case SVM_GETBOTTOMMARGIN:
-            return 0;
-        case SVM_SETCONTPOS:
-        case SVM_MAKEPOSVISIBLE:
-            if (static_cast<long>(lp) >= 0) {
-                sv->top = std::max(0, std::min(static_cast<int>(lp),
-                                               std::max(0, sv_content_height(sv) - RECTH(rc))));
-                InvalidateRect(h, nullptr, TRUE);
-            }
-            return 0;
-        case SVM_GETVISIBLEWIDTH:
-        case SVM_GETCONTWIDTH:
-            return RECTW(rc);
-        case SVM_GETVISIBLEHEIGHT:
-        case SVM_GETVSCROLLPAGEVAL:
-            return RECTH(rc);
-        case SVM_GETCONTHEIGHT:
-            return sv_content_height(sv);
-        case SVM_GETMARGINS:
-            if (lp != 0) SetRectEmpty(reinterpret_cast<RECT *>(lp));
-            return 0;
         default:
-            return 0;
+            return sv_geometry(h, sv, msg, lp);
     }
 }
 
