@@ -18,6 +18,13 @@ enum mmi_colour {
     MMI_COLOUR_FRAME = 20,         // separators and frames
     MMI_COLOUR_CONTROL = 21,       // a dialog's button background
     MMI_COLOUR_HILIGHT = 22,       // the chosen row or button
+    // The plain colours of the LCD test.
+    MMI_COLOUR_DARK_GRAY = 7,
+    MMI_COLOUR_PURE_BLUE = 9,
+    MMI_COLOUR_PURE_GREEN = 10,
+    MMI_COLOUR_PURE_RED = 12,
+    MMI_COLOUR_LIGHT_WHITE = 15,
+    MMI_COLOUR_BLACK = 16,
 };
 
 // The screen pixel of a palette entry.

@@ -138,6 +138,11 @@ int ftx_config_Get_TestItem_Config_Paras(const char *domain) {
     return -1;
 }
 
+const testitem *mmi_testitem_main_row(const char *domain) {
+    const int i = ftx_config_Get_TestItem_Config_Paras(domain);
+    return i < 0 ? nullptr : &s_catalogue.load()->main.rows[i];
+}
+
 void mmi_build_test_lists(void) {
     Get_MonomerPreviewTestItem_Config();
     Get_TestItem_Config(0);

@@ -60,3 +60,5 @@ void mmi_build_test_lists(void);
 
 // Main-table row whose config_domain is a prefix of domain, or -1.
 int ftx_config_Get_TestItem_Config_Paras(const char *domain);
+// That row itself (its configured flags and parameter string), or null.
+const testitem *mmi_testitem_main_row(const char *domain);

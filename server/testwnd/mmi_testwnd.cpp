@@ -7,6 +7,8 @@
 #include <string.h>
 #include <time.h>
 
+#include <algorithm>
+#include <iterator>
 #include <vector>
 
 #include <android/log.h>
@@ -115,16 +117,22 @@ void mmi_testwnd_unregister(HWND hWnd) {
 }
 
 int Check_AllTestWnd_Closed(void) {
+    return mmi_testwnd_close_others(HWND_INVALID);
+}
+
+int mmi_testwnd_close_others(HWND keep) {
     int closed = 0;
     for (;;) {
         OpenWindow w;
         {
             std::lock_guard<std::mutex> lk(s_openLock);
-            if (s_open.empty()) break;
-            w = s_open.back();
-            s_open.pop_back();
+            auto it = std::find_if(s_open.rbegin(), s_open.rend(),
+                                   [keep](const OpenWindow &o) { return o.hwnd != keep; });
+            if (it == s_open.rend()) break;
+            w = *it;
+            s_open.erase(std::next(it).base());
         }
-        TW_DEBUG("FTX_MAIN", "%s close hwnd=%p", __func__, w.hwnd);
+        TW_DEBUG("FTX_MAIN", "%s close hwnd=%p", "Check_AllTestWnd_Closed", w.hwnd);
         if (w.stop) w.stop();
         closed++;
     }

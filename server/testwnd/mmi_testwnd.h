@@ -112,3 +112,5 @@ void mmi_get_current_test(char *out, size_t size);
 void mmi_testwnd_register_open(HWND hWnd, int (*stop)(void));
 void mmi_testwnd_unregister(HWND hWnd);
 int Check_AllTestWnd_Closed(void);
+// The same, leaving `keep` open (a window the PC repaints instead of opening anew).
+int mmi_testwnd_close_others(HWND keep);

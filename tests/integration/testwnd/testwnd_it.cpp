@@ -305,8 +305,7 @@ TEST(DeviceList, ShowsEachItemInTheColourOfItsResultAfterARun) {
 }
 
 TEST(MonomerPreview, HardwareVersionShowsTheFirmwareAndHandsOverToTheNextItem) {
-    // The preview list of the image: the hardware version, then the monomer LCD (no window
-    // yet: its entry only logs).
+    // The preview list of the image: the hardware version, then the monomer LCD.
     Handset h({kVibrator});
     h.dut.setConfig("FTX_TPSELF", "enable", "0");
     ASSERT_TRUE(h.start());
@@ -318,7 +317,7 @@ TEST(MonomerPreview, HardwareVersionShowsTheFirmwareAndHandsOverToTheNextItem) {
     h.shotWhen("monomer_hardware_version.png",
                [](const Png &p) { return p.count(90, 100, 630, 400, light) > 100; });
     h.key(60);
-    EXPECT_TRUE(h.dut.waitLog("mmi_Monomer_LCDColorTestEntry: test not available yet"));
+    EXPECT_TRUE(h.dut.waitLog("FTX_MONOMER_LCD: create_colour_window end"));
     EXPECT_EQ(0, h.result(64));  // the preview records nothing
 }
 

@@ -11,7 +11,8 @@
 #include "unit/config/log_capture.h"
 #include "mmi_startup.h"
 #include "pending/audio.h"
-#include "pending/display.h"
+#include "testwnd/display/mmi_testwnd_auxlcdhint.h"
+#include "testwnd/display/mmi_testwnd_lcd.h"
 #include "pending/sensors.h"
 #include "testwnd/catalogue.h"
 

@@ -1,0 +1,204 @@
+// The real ftx-mmi, headless: the LCD colour test as the operator runs it and as the PC
+// drives it, the gray level, hue and panel commands, the calibration pictures, the
+// backlight, and the auxiliary display across the restart between the two LCD passes.
+#include <sys/stat.h>
+
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include "support/handset.h"
+
+using namespace handset;
+
+namespace {
+
+const Item kLcd = {"FTX_LCD", 1, 0, 1};
+const Item kCards = {"FTX_CARDS", 1, 0, 1};
+const char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not available yet";
+const char kFoolProofEnd[] = "WaitForFoolProofLcd end";
+const char kTouchIgnored[] = "touched touch ignored";
+
+struct Colour {
+    int r, g, b;
+};
+// The five colours of the default table; the first white is one step below full white.
+const Colour kFive[] = {{255, 255, 254}, {255, 0, 0}, {0, 255, 0}, {0, 0, 255}, {0, 0, 0}};
+
+// Every pixel of the screen, title strip and soft-key bar included, has colour c.
+bool filled(const Png &p, Colour c) {
+    const int n = p.count(0, 0, p.w, p.h,
+                          [c](int r, int g, int b) { return r == c.r && g == c.g && b == c.b; });
+    return n == p.w * p.h;
+}
+
+// Full-screen windows in front of everything (the colour screens).
+int fullScreenWindows(Handset &h) {
+    const std::string w = h.dut.console("windows");
+    int n = 0;
+    for (size_t p = w.find("rect=0,0,720,1280"); p != std::string::npos;
+         p = w.find("rect=0,0,720,1280", p + 1))
+        n++;
+    return n;
+}
+
+void tap(Handset &h) {
+    EXPECT_TRUE(h.dut.consoleOk("tap 360 640"));
+}
+
+// Shows colours `from`.. of `colours` one touch each, each after its fool-proof second.
+void touchThrough(Handset &h, const Colour *colours, int from, int to, const std::string &shot) {
+    for (int i = from; i < to; i++) {
+        SCOPED_TRACE(i);
+        h.shotWhen(shot + std::to_string(i) + ".png",
+                   [&](const Png &p) { return filled(p, colours[i]); });
+        ASSERT_TRUE(h.dut.waitLogCount(kFoolProofEnd, (size_t)i + 1));
+        tap(h);
+    }
+}
+
+bool passLabel(const Png &p) {
+    return p.count(0, 1185, 240, 1280, light) > 20;
+}
+
+TEST(LcdColours, ARunShowsFiveColoursThenTheConfirmationAndPassOpensTheNextItem) {
+    Handset h({kLcd, kCards});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    h.openDeviceList();
+    h.chooseRow(0);  // the full run: the LCD test is its first item
+    touchThrough(h, kFive, 0, 5, "lcd_colour_");
+    h.keepForDocs("lcd_colour_1.png", "lcd_colour_red.png");
+    ASSERT_TRUE(h.waitActive("LCD Color Test"));
+    EXPECT_EQ(0, fullScreenWindows(h));  // the colour window went with the last touch
+    Png check = h.shotWhen("lcd_confirmation.png", passLabel);
+    // The note in the window, the soft-key bar back with both labels.
+    EXPECT_GT(check.count(90, 100, 630, 300, light), 50);
+    EXPECT_GT(check.count(480, 1185, 720, 1280, light), 20);
+    h.key(60);
+    ASSERT_TRUE(h.dut.waitLog(kCardsOpened));
+    EXPECT_EQ(1, h.result(280));
+    EXPECT_EQ(0, h.result(64));
+}
+
+TEST(LcdColours, ATouchInsideTheFirstSecondIsLostAndMmiTwoShowsOneColour) {
+    // Scaled so the fool-proof second lasts four: the first touch comes well inside it.
+    Handset h({{"FTX_LCD", 1, 2, 1}}, 4.0);
+    ASSERT_TRUE(h.start());
+    h.openDeviceList();
+    h.chooseRow(4);
+    h.shotWhen("lcd_white.png", [](const Png &p) { return filled(p, kFive[0]); });
+    tap(h);
+    ASSERT_TRUE(h.dut.waitLog(kTouchIgnored));
+    const size_t end = h.dut.logPos(kFoolProofEnd);
+    EXPECT_TRUE(end == std::string::npos || end > h.dut.logPos(kTouchIgnored));
+    // Still white after the lost touch; once the second is over one touch ends the colours.
+    h.shotWhen("lcd_white_kept.png", [](const Png &p) { return filled(p, kFive[0]); });
+    ASSERT_TRUE(h.dut.waitLog(kFoolProofEnd, 15000));
+    tap(h);
+    ASSERT_TRUE(h.waitActive("LCD Color Test"));
+    h.key(61);
+    ASSERT_TRUE(h.waitActive("Device Test"));
+    EXPECT_EQ(0, h.result(280));  // outside a run the keys leave the record alone
+}
+
+TEST(LcdColours, SixColoursStartWithExactWhiteThenDarkGray) {
+    Handset h({kLcd});
+    h.dut.setConfig("FTX_LCD", "parameter", "colornum:6");
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    h.openDeviceList();
+    h.chooseRow(4);
+    const Colour six[] = {{255, 255, 255}, {128, 128, 128}};
+    touchThrough(h, six, 0, 1, "lcd_six_");
+    h.shotWhen("lcd_six_1.png", [&](const Png &p) { return filled(p, six[1]); });
+    EXPECT_TRUE(h.dut.waitLog("mmi_LCDColorTest_Init::LcdColorTestNum=6"));
+    EXPECT_EQ(0, h.dut.pc("LCDMoudle testItem close").first);
+    ASSERT_TRUE(h.waitActive("Device Test"));
+}
+
+TEST(LcdPc, EachColourRepaintsTheOneWindowAndCloseDestroysIt) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    const char *commands[] = {"FFFFFF", "FF0000", "00FF00", "0000FF", "000000"};
+    for (int i = 0; i < 5; i++) {
+        SCOPED_TRACE(commands[i]);
+        ASSERT_EQ(0, h.dut.pc(std::string("LCDMoudle testItem ") + commands[i]).first);
+        h.shotWhen("lcd_pc.png", [&](const Png &p) { return filled(p, kFive[i]); });
+        EXPECT_EQ(1, fullScreenWindows(h));
+    }
+    EXPECT_EQ(1u, h.dut.logCount("FTX_LCD: create_colour_window end"));
+    EXPECT_EQ(0, h.dut.pc("LCDMoudle testItem close").first);
+    EXPECT_EQ(0, fullScreenWindows(h));
+    // The menu is back with its soft-key bar.
+    h.shotWhen("lcd_pc_closed.png", [](const Png &p) {
+        const unsigned char *bar = p.at(360, 1270);
+        return bar[0] == 0x1C && bar[1] == 0x22 && bar[2] == 0x2B;
+    });
+}
+
+TEST(LcdPc, AGrayLevelKeepsTheWindowAgainstTouchesUntilClose) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    EXPECT_EQ(2, h.dut.pc("GrayLevelMoudle testItem set ,,").first);
+    EXPECT_EQ(0, fullScreenWindows(h));
+    ASSERT_EQ(0, h.dut.pc("GrayLevelMoudle testItem set 128,128,128").first);
+    EXPECT_TRUE(h.dut.waitLog("mmi_AutoTest_GrayLevel_Set RGB value: 128 128 128"));
+    EXPECT_TRUE(h.dut.waitLog("RGB int value: 8421504"));
+    ASSERT_TRUE(h.dut.waitLog(kFoolProofEnd));
+    tap(h);
+    ASSERT_TRUE(h.dut.waitLog(kTouchIgnored));
+    EXPECT_EQ(1, fullScreenWindows(h));
+    ASSERT_EQ(0, h.dut.pc("GrayLevelMoudle testItem set close").first);
+    EXPECT_TRUE(dut_wait_until([&] { return fullScreenWindows(h) == 0; }, 5000));
+}
+
+TEST(LcdPc, HueAndHueRegistersWriteThePanelFilesAndRefuseBadRequests) {
+    Handset h({kLcd});
+    h.dut.write("/proc/panel_hue_dll_main_switch", "");
+    h.dut.write("/proc/panel_hue_dll_main1_switch", "");
+    h.dut.write("/data/panel_hue_dll_main_switch_temp", "0x12 0x34\n\n");
+    h.dut.write("/data/panel_hue_dll_main1_switch_temp", "0x56\n");
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+
+    EXPECT_EQ(0, h.dut.pc("HueMoudle testItem set main,3").first);
+    EXPECT_EQ("3\n", h.dut.read("/proc/panel_hue_main_switch"));
+    EXPECT_EQ(2, h.dut.pc("HueMoudle testItem set main").first);
+    EXPECT_EQ(2, h.dut.pc("HueMoudle testItem set ../../data/x,3").first);
+    EXPECT_FALSE(h.dut.exists("/data/x_switch"));
+
+    // An unknown panel or a missing field changes nothing.
+    EXPECT_EQ(2, h.dut.pc("HueRegMoudle testItem set main,reg,lg").first);
+    EXPECT_EQ(2, h.dut.pc("HueRegMoudle testItem set main,reg").first);
+    EXPECT_EQ("", h.dut.read("/proc/panel_hue_dll_main_switch"));
+    // The panel of one register file, and of two.
+    EXPECT_EQ(0, h.dut.pc("HueRegMoudle testItem set main,reg,truly").first);
+    EXPECT_EQ("0x12 0x34", h.dut.read("/proc/panel_hue_dll_main_switch"));
+    EXPECT_EQ("", h.dut.read("/proc/panel_hue_dll_main1_switch"));
+    EXPECT_EQ(0, h.dut.pc("HueRegMoudle testItem set main,reg,jdi").first);
+    EXPECT_EQ("0x56", h.dut.read("/proc/panel_hue_dll_main1_switch"));
+    EXPECT_EQ(0, h.dut.pc("HueRegMoudle testItem set main,default,jdi").first);
+    EXPECT_EQ("\n", h.dut.read("/proc/panel_hue_dll_main_switch"));
+    // A register the panel does not have.
+    EXPECT_EQ(2, h.dut.pc("HueRegMoudle testItem set gamma,reg,truly").first);
+}
+
+TEST(LcdPc, TurnOffWakeUpAndCabcReachTheirFiles) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    EXPECT_EQ(0, h.dut.pc("LCDTurnoffMoudle testItem").first);
+    EXPECT_EQ("4\n", h.dut.read("/sys/class/graphics/fb0/blank"));
+    EXPECT_EQ(0, h.dut.pc("LCDWakeupMoudle testItem").first);
+    EXPECT_EQ("0\n", h.dut.read("/sys/class/graphics/fb0/blank"));
+    EXPECT_NE(std::string::npos, h.dut.console("hw status").find("ftx_api_LCD_Refresh(arg=0) x1"));
+    EXPECT_EQ(0, h.dut.pc("CABCMoudle testItem open").first);
+    EXPECT_EQ("2\n", h.dut.read("/proc/panel_cabc_level_switch"));
+    EXPECT_EQ(0, h.dut.pc("CABCMoudle testItem close").first);
+    EXPECT_EQ("0\n", h.dut.read("/proc/panel_cabc_level_switch"));
+}
+
+}  // namespace
