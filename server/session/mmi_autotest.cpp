@@ -201,14 +201,19 @@ void finish_run(void) {
         return;
     }
     // Item 64 stays failed between the two LCD passes; the next start runs the auxiliary one.
-    if (!file_exists(AUTOTEST_AUX_LCD_FLAG_FILE)) {
+    const bool mainPass = !file_exists(AUTOTEST_AUX_LCD_FLAG_FILE);
+    if (mainPass) {
         g_autotestOps.write_result(AUTOTEST_ITEM_CAC_PREVIEW, 2);
+        AT_DEBUG("touch %s", AUTOTEST_AUX_LCD_FLAG_FILE);
         touch_file(AUTOTEST_AUX_LCD_FLAG_FILE);
     } else {
         remove_file(AUTOTEST_FB0_BLACK_FLAG_FILE);
+        AT_DEBUG("echo 1 > %s", AUTOTEST_TS_MAIN_CTRL_FILE);
         write_text_file(AUTOTEST_TS_MAIN_CTRL_FILE, "1\n");
         remove_file(AUTOTEST_AUX_LCD_FLAG_FILE);
     }
+    AT_DEBUG("%s: the %s LCD pass is over: LCD off, the process ends", __func__,
+             mainPass ? "main" : "auxiliary");
     g_autotestOps.lcd_off();
     g_autotestOps.exit_process(0);
 }

@@ -201,4 +201,86 @@ TEST(LcdPc, TurnOffWakeUpAndCabcReachTheirFiles) {
     EXPECT_EQ("0\n", h.dut.read("/proc/panel_cabc_level_switch"));
 }
 
+TEST(MonomerLcd, FiveColoursWithoutDelayThenTheNextPreviewScreen) {
+    // The preview's touch screen follows its colours.
+    Handset h({kLcd, {"FTX_TOUCH", 1, 0, 1}});
+    h.dut.setConfig("FTX_TPSELF", "enable", "0");
+    h.dut.setConfig("FTX_MONOMER_HARDVERSION", "enable", "0");
+    ASSERT_TRUE(h.start());
+    h.key(108);
+    h.key(108);
+    h.key(28);  // the preview: its colours are the first screen left
+    for (int i = 0; i < 5; i++) {
+        SCOPED_TRACE(i);
+        h.shotWhen("monomer_lcd.png", [&](const Png &p) { return filled(p, kFive[i]); });
+        tap(h);
+    }
+    EXPECT_TRUE(h.dut.waitLog("mmi_testwnd_Monomer_touchTestEntry: test not available yet"));
+    EXPECT_EQ(0u, h.dut.logCount("WaitForFoolProofLcd begin"));
+    EXPECT_EQ(0, fullScreenWindows(h));
+    EXPECT_EQ(0, h.result(280));
+}
+
+const Item kAuxHint = {"FTX_AUXLCD_HINT", 1, 0, 1};
+
+// The LCD item of a run: five colours, then pass on the confirmation.
+void passLcd(Handset &h, size_t foolProofEndsBefore) {
+    for (int i = 0; i < 5; i++) {
+        SCOPED_TRACE(i);
+        h.shotWhen("lcd_run.png", [&](const Png &p) { return filled(p, kFive[i]); });
+        ASSERT_TRUE(h.dut.waitLogCount(kFoolProofEnd, foolProofEndsBefore + (size_t)i + 1));
+        tap(h);
+    }
+    ASSERT_TRUE(h.waitActive("LCD Color Test"));
+    h.key(60);
+}
+
+TEST(AuxLcdRun, BothLcdPassesRunAcrossTheRestartBetweenThem) {
+    Handset h({kLcd, kAuxHint});
+    h.dut.setConfig("MMI", "aux_lcd", "1");
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    h.openDeviceList();
+    h.chooseRow(0);
+    passLcd(h, 0);
+    // The hint ends the main pass: item 64 stays failed and the process ends.
+    ASSERT_TRUE(h.waitActive("Auxiliary LCD Test"));
+    Png hint = h.shotWhen("aux_lcd_hint.png", [](const Png &p) {
+        return p.count(90, 100, 630, 300, light) > 50 && p.count(0, 1185, 240, 1280, light) > 20;
+    });
+    h.key(60);
+    ASSERT_EQ(0, h.dut.wait(10000));
+    EXPECT_TRUE(h.dut.exists("/data/pv_aux_lcd_test_flag"));
+    EXPECT_TRUE(h.dut.logPos("the main LCD pass is over") != std::string::npos);
+
+    // The next start: the full run is the auxiliary pass, whose list holds the LCD only.
+    h.dut.write("/data/fb0_black_flag", "");
+    const size_t ends = h.dut.logCount(kFoolProofEnd);
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    EXPECT_EQ(2, h.result(64));
+    h.openDeviceList();
+    h.chooseRow(0);
+    ASSERT_TRUE(h.dut.waitLog("Get_AuxLCD_TestItem_Config domain=FTX_LCD,enable=1"));
+    EXPECT_EQ("0\n", h.dut.read("/proc/touchscreen/ts_main_ctrl"));
+    passLcd(h, ends);
+    ASSERT_EQ(0, h.dut.wait(10000));
+    const std::string log = h.dut.logcat();
+    const size_t black = log.find("rm /data/fb0_black_flag"),
+                 touch = log.find("echo 1 > /proc/touchscreen/ts_main_ctrl"),
+                 flag = log.find("rm /data/pv_aux_lcd_test_flag");
+    ASSERT_NE(std::string::npos, black);
+    EXPECT_LT(black, touch);
+    EXPECT_LT(touch, flag);
+    EXPECT_NE(std::string::npos, log.find("the auxiliary LCD pass is over"));
+    EXPECT_FALSE(h.dut.exists("/data/fb0_black_flag"));
+    EXPECT_FALSE(h.dut.exists("/data/pv_aux_lcd_test_flag"));
+    EXPECT_EQ("1\n", h.dut.read("/proc/touchscreen/ts_main_ctrl"));
+    // The auxiliary pass ends like every full run, with the preview item passed.
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    EXPECT_EQ(1, h.result(64));
+    EXPECT_EQ(1, h.result(280));
+}
+
 }  // namespace
