@@ -25,38 +25,7 @@ namespace {
 const char kPanelInfo[] = "/proc/msm_lcd";
 const char kTouchMainCtrl[] = "/proc/touchscreen/ts_main_ctrl";
 const char kFb0BlackFlag[] = "/data/fb0_black_flag";
-const size_t kFieldSize = 64;
 const size_t kLineSize = 256;
-
-// Comma-separated fields of a request; a missing one stays empty.
-struct Fields {
-    char f[3][kFieldSize] = {};
-    int count = 0;
-};
-
-Fields split_fields(const char *parm, int max) {
-    Fields out;
-    if (parm == nullptr) return out;
-    char text[kLineSize] = {0};
-    tp_os_strlcpy(text, parm, sizeof(text));
-    char *save = nullptr;
-    for (char *t = strtok_r(text, ",", &save); t != nullptr && out.count < max;
-         t = strtok_r(nullptr, ",", &save)) {
-        tp_os_strlcpy(out.f[out.count++], t, kFieldSize);
-    }
-    return out;
-}
-
-// A field that becomes part of a file name or a shell line: letters, digits, '_' and '-'
-// (a value may also hold '.'), so no request can reach another file or the shell.
-bool plain(const char *s, bool value) {
-    if (*s == '\0') return false;
-    for (; *s != '\0'; s++) {
-        unsigned char c = (unsigned char)*s;
-        if (!isalnum(c) && c != '_' && c != '-' && !(value && c == '.')) return false;
-    }
-    return true;
-}
 
 int copy_register(const char *name, const char *suffix, int length) {
     char from[kLineSize], to[kLineSize];
@@ -83,6 +52,28 @@ void run_line(const char *fmt, const char *arg) {
 
 }  // namespace
 
+void mmi_lcd_split_fields(const char *parm, int max, mmi_lcd_fields *out) {
+    memset(out, 0, sizeof(*out));
+    if (parm == nullptr) return;
+    if (max > 3) max = 3;
+    char text[kLineSize] = {0};
+    tp_os_strlcpy(text, parm, sizeof(text));
+    char *save = nullptr;
+    for (char *t = strtok_r(text, ",", &save); t != nullptr && out->count < max;
+         t = strtok_r(nullptr, ",", &save)) {
+        tp_os_strlcpy(out->f[out->count++], t, MMI_LCD_FIELD_SIZE);
+    }
+}
+
+bool mmi_lcd_plain_field(const char *s, bool value) {
+    if (s == nullptr || *s == '\0') return false;
+    for (; *s != '\0'; s++) {
+        unsigned char c = (unsigned char)*s;
+        if (!isalnum(c) && c != '_' && c != '-' && !(value && c == '.')) return false;
+    }
+    return true;
+}
+
 int read_regvalue_from_file(const char *path, char *buffer, int length) {
     if (path == nullptr || buffer == nullptr || length < 0) return -1;
     int fd = dev_open(path, O_RDONLY);
@@ -101,7 +92,9 @@ int read_regvalue_from_file(const char *path, char *buffer, int length) {
 
 int write_regvalue_to_file(const char *path, const char *text) {
     if (path == nullptr || text == nullptr) return -1;
-    int fd = dev_open(path, O_WRONLY);
+    // A kernel file takes the whole text as one value; the host's plain file must not keep
+    // the tail of a longer earlier one.
+    int fd = dev_open(path, O_WRONLY | O_TRUNC);
     if (fd < 0) {
         LCD_ERROR("open %s fails.", path);
         return -1;
@@ -114,9 +107,10 @@ int write_regvalue_to_file(const char *path, const char *text) {
 }
 
 int mmi_AutoTest_Hue_Set(const char *parm, int, char *, unsigned int) {
-    const Fields x = split_fields(parm, 2);
+    mmi_lcd_fields x;
+    mmi_lcd_split_fields(parm, 2, &x);
     if (x.count < 2) return 0;
-    if (!plain(x.f[0], false) || !plain(x.f[1], true)) {
+    if (!mmi_lcd_plain_field(x.f[0], false) || !mmi_lcd_plain_field(x.f[1], true)) {
         LCD_ERROR("%s: refused \"%s\"", __func__, parm);
         return 0;
     }
@@ -128,11 +122,12 @@ int mmi_AutoTest_Hue_Set(const char *parm, int, char *, unsigned int) {
 
 int mmi_AutoTest_Hue_Register_Set(const char *parm, int, char *, unsigned int) {
     LCD_DEBUG("%s begin.", __func__);
-    const Fields x = split_fields(parm, 3);
+    mmi_lcd_fields x;
+    mmi_lcd_split_fields(parm, 3, &x);
     const char *name = x.f[0], *action = x.f[1], *panel = x.f[2];
     LCD_DEBUG("%s, %s %s %s", __func__, name, action, panel);
     if (x.count < 3) return 0;
-    if (!plain(name, false)) {
+    if (!mmi_lcd_plain_field(name, false)) {
         LCD_ERROR("%s: refused name \"%s\"", __func__, name);
         return 0;
     }

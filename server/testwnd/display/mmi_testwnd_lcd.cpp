@@ -18,6 +18,7 @@
 #include "mmi_guithread.h"
 #include "mmi_theme.h"
 #include "session/mmi_testitem.h"
+#include "testwnd/display/mmi_lcd_panel.h"
 #include "testwnd/mmi_testwnd.h"
 #include "tp_os.h"
 
@@ -383,14 +384,10 @@ int mmi_AutoTest_GrayLevel_Set(const char *parm, int, char *, unsigned int) {
         mmi_RunOnGuiThread(close_screen, &s_lcd);
         return 1;
     }
-    char text[MMI_TESTWND_TEXT_SIZE] = {0};
-    if (parm != nullptr) tp_os_strlcpy(text, parm, sizeof(text));
-    char *save = nullptr;
-    const char *f[3] = {strtok_r(text, ",", &save), nullptr, nullptr};
-    if (f[0] == nullptr) return 0;
-    f[1] = strtok_r(nullptr, ",", &save);
-    f[2] = f[1] ? strtok_r(nullptr, ",", &save) : nullptr;
-    const int r = atoi(f[0]), g = f[1] ? atoi(f[1]) : 0, b = f[2] ? atoi(f[2]) : 0;
+    mmi_lcd_fields x;
+    mmi_lcd_split_fields(parm, 3, &x);
+    if (x.count < 1) return 0;
+    const int r = atoi(x.f[0]), g = atoi(x.f[1]), b = atoi(x.f[2]);
     LCD_DEBUG(s_lcd.tag, "%s RGB value: %d %d %d", __func__, r, g, b);
     s_lcd.grayLevel = 1;
     s_lcd.grayValue = mmi_lcd_pack_gray(r, g, b);
