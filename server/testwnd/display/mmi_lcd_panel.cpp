@@ -1,7 +1,6 @@
 // The panel's kernel files, the backlight and the auxiliary display, from the PC.
 #include "testwnd/display/mmi_lcd_panel.h"
 
-#include <ctype.h>
 #include <dlfcn.h>
 #include <errno.h>
 #include <fcntl.h>
@@ -51,28 +50,6 @@ void run_line(const char *fmt, const char *arg) {
 }
 
 }  // namespace
-
-void mmi_lcd_split_fields(const char *parm, int max, mmi_lcd_fields *out) {
-    memset(out, 0, sizeof(*out));
-    if (parm == nullptr) return;
-    if (max > 3) max = 3;
-    char text[kLineSize] = {0};
-    tp_os_strlcpy(text, parm, sizeof(text));
-    char *save = nullptr;
-    for (char *t = strtok_r(text, ",", &save); t != nullptr && out->count < max;
-         t = strtok_r(nullptr, ",", &save)) {
-        tp_os_strlcpy(out->f[out->count++], t, MMI_LCD_FIELD_SIZE);
-    }
-}
-
-bool mmi_lcd_plain_field(const char *s, bool value) {
-    if (s == nullptr || *s == '\0') return false;
-    for (; *s != '\0'; s++) {
-        unsigned char c = (unsigned char)*s;
-        if (!isalnum(c) && c != '_' && c != '-' && !(value && c == '.')) return false;
-    }
-    return true;
-}
 
 int read_regvalue_from_file(const char *path, char *buffer, int length) {
     if (path == nullptr || buffer == nullptr || length < 0) return -1;

@@ -5,6 +5,8 @@
 
 #include <stddef.h>
 
+#include "testwnd/display/mmi_lcd_request.h"
+
 // "NAME,VALUE": the value into the panel's hue switch of that name.
 int mmi_AutoTest_Hue_Set(const char *parm, int parmLen, char *reply, unsigned int replySize);
 // "NAME,ACTION,PANEL": ACTION "reg" copies the prepared register file(s) of NAME into the
@@ -21,18 +23,6 @@ int mmi_AutoTest_AUX_LCDColorTestEntry(int index);
 int mmi_AutoTest_AUX_LCDColorTest_Stop_Entry(void);
 // "main" or "aux": which display shows and takes touches.
 int mmi_AutoTest_Switch_Display(const char *parm, int parmLen, char *reply, unsigned int replySize);
-
-// The comma-separated fields of a PC request (at most three, each cut to 63 bytes);
-// empty fields are skipped, as strtok does.
-#define MMI_LCD_FIELD_SIZE 64
-struct mmi_lcd_fields {
-    char f[3][MMI_LCD_FIELD_SIZE];
-    int count;
-};
-void mmi_lcd_split_fields(const char *parm, int max, mmi_lcd_fields *out);
-// True for a field that may become part of a file name or a shell line: letters, digits,
-// '_' and '-' (a value may also hold '.'); never empty.
-bool mmi_lcd_plain_field(const char *s, bool value);
 
 // A register file's text, up to length bytes, trailing line feeds dropped; buffer holds
 // length + 1. The length left, or -1.

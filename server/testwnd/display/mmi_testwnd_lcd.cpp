@@ -18,7 +18,7 @@
 #include "mmi_guithread.h"
 #include "mmi_theme.h"
 #include "session/mmi_testitem.h"
-#include "testwnd/display/mmi_lcd_panel.h"
+#include "testwnd/display/mmi_lcd_request.h"
 #include "testwnd/mmi_testwnd.h"
 #include "tp_os.h"
 
