@@ -14,8 +14,6 @@ using namespace handset;
 namespace {
 
 const Item kLcd = {"FTX_LCD", 1, 0, 1};
-const Item kCards = {"FTX_CARDS", 1, 0, 1};
-const char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not available yet";
 const char kFoolProofEnd[] = "WaitForFoolProofLcd end";
 const char kTouchIgnored[] = "touched touch ignored";
 

@@ -12,9 +12,6 @@ using namespace handset;
 namespace {
 
 const Item kVibrator = {"FTX_VIBRATOR", 1, 0, 1};
-// The card test has no window yet: its entry only logs, which is enough to see it opened.
-const Item kCards = {"FTX_CARDS", 1, 0, 1};
-const char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not available yet";
 const char kRefused[] = "device autotest running,please exit autotest.";
 
 // The device-test list on 720x1280: rows 96 high below the 3-pixel line; 0 the full run

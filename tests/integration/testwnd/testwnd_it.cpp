@@ -14,9 +14,6 @@ using namespace handset;
 
 namespace {
 
-// The card test has no window yet: its entry only logs, which is enough to see it opened.
-const char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not available yet";
-
 const Item kVibrator = {"FTX_VIBRATOR", 1, 0, 1};
 
 // Milliseconds since midnight of the log line that holds text (logcat's "MM-DD
@@ -108,9 +105,6 @@ TEST(TestWindow, KeysOutsideARunLeaveTheRecordAlone) {
     EXPECT_NE(std::string::npos,
               h.dut.console("hw status").find("ftx_api_Vibrator_Test_Stop() x2"));
 }
-
-// Cards after the vibrator: a run that passes the vibrator opens the cards next.
-const Item kCards = {"FTX_CARDS", 1, 0, 1};
 
 TEST(Run, PassRecordsAndOpensTheNextItem) {
     Handset h({kVibrator, kCards});
