@@ -39,9 +39,13 @@ int no_device_list(void) {
 }
 void no_refresh(void) {}
 
+// The process ends at once, as a handset that is switched off: the other threads (the PC
+// channel, the battery observer, fool-proof timers) are still running, so the globals they
+// use must not be destroyed under them.
 void exit_default(int status) {
     fflush(nullptr);
-    exit(status);
+    dev_sync();
+    _exit(status);
 }
 
 }  // namespace
