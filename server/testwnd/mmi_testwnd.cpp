@@ -299,7 +299,6 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             d->state->hwnd = hWnd;
             if (d->start.bound()) (*d->start.op)(d->state->mode.load());
             mmi_set_current_test(domain_of(d));
-            mmi_testwnd_start_foolproof(d->state, d->foolProofSeconds, domain_of(d));
             break;
         }
         case MSG_TIMER:
@@ -373,6 +372,9 @@ HWND mmi_testwnd_open(const mmi_testwnd_desc *d, int mode) {
     tp_skb_set_text_items(hWnd, "", "", "");
     tp_batteryshow_set_text_items(hWnd, "", "", "");
     mmi_testwnd_show_keys(hWnd, title_of(d), 0);
+    // The delay starts once the fail label is up, so the pass label can only come after it
+    // (a short delay's message could otherwise be handled first and then be overwritten).
+    mmi_testwnd_start_foolproof(d->state, d->foolProofSeconds, domain_of(d));
     return hWnd;
 }
 

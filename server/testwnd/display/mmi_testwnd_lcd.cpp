@@ -42,7 +42,11 @@ struct ColourScreen {
     int (*stopEntry)(void);
 
     uint32_t table[MMI_LCD_MAX_COLOURS] = {};
+    std::atomic<int> tableSize{5};
     std::atomic<int> count{0};
+    // A new colour was asked for (the window opened, a touch, the PC); any other paint (the
+    // screen uncovered) shows the colour that is up again without moving on.
+    std::atomic<bool> nextColour{false};
     std::atomic<uint64_t> index{0};
     std::atomic<HWND> hwnd{HWND_INVALID};
     std::atomic<unsigned char> foolProof{0};
@@ -120,16 +124,23 @@ void paint(HWND hWnd, ColourScreen *s) {
         LCD_DEBUG(s->tag, "%s MSG_PAINT end", __func__);
         return;
     }
-    // A paint after the last colour (the screen uncovered) shows the last one again.
+    // The colour at the index moves on only when a new colour was asked for.
+    const bool next = s->nextColour.exchange(false);
     uint64_t i = s->index.load();
-    const bool past = i >= MMI_LCD_MAX_COLOURS || (int)i >= s->count.load();
-    const uint64_t shown = past ? (uint64_t)(s->count.load() > 0 ? s->count.load() - 1 : 0) : i;
-    SetBrushColor(hdc, s->table[shown]);
+    if (!next && i > 0) i--;
+    const int last = s->tableSize.load() - 1;
+    SetBrushColor(hdc, s->table[i > (uint64_t)last ? last : i]);
     FillBox(hdc, 0, 0, g_ptScreenInfo.width, g_ptScreenInfo.height);
     EndPaint(hWnd, hdc);
-    if (!s->preview) start_fool_proof(s);
+    if (next && !s->preview) start_fool_proof(s);
     LCD_DEBUG(s->tag, "%s MSG_PAINT end", __func__);
-    if (!past) s->index++;
+    if (next) s->index++;
+}
+
+// Asks for the colour at the index.
+void paint_next(HWND hWnd, ColourScreen *s) {
+    s->nextColour = true;
+    UpdateWindow(hWnd, TRUE);
 }
 
 // The touch was released: the next colour, or the end of the colours.
@@ -139,7 +150,7 @@ void touched(HWND hWnd, ColourScreen *s) {
         return;
     }
     if ((int)s->index.load() < s->count.load()) {
-        UpdateWindow(hWnd, TRUE);
+        paint_next(hWnd, s);
         return;
     }
     SendMessage(hWnd, MSG_CLOSE, 0, 0);
@@ -158,6 +169,7 @@ LRESULT colour_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
                 reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
             mmi_set_current_test(s->row->domain);
             if (!s->autoMode) s->index = 0;
+            s->nextColour = true;
             tp_skb_show(0);
             break;
         case MSG_PAINT:
@@ -220,6 +232,7 @@ HWND create_colour_window(ColourScreen *s) {
 
 void fill_preview_table(void) {
     s_preview.count = mmi_lcd_monomer_table(s_preview.table);
+    s_preview.tableSize = s_preview.count.load();
 }
 
 // On the GUI thread: opens the screen, or repaints it when the PC opened it already.
@@ -227,7 +240,7 @@ int open_or_repaint(void *arg) {
     ColourScreen *s = static_cast<ColourScreen *>(arg);
     HWND open = s->hwnd.load();
     if (s->windowOpen && open != HWND_INVALID) {
-        UpdateWindow(open, TRUE);
+        paint_next(open, s);
         return 1;
     }
     s->windowOpen = 1;
@@ -340,6 +353,7 @@ int mmi_LCDColorTest_Init(void) {
     s_lcd.count = atoi(colornum);
     LCD_DEBUG(s_lcd.tag, "%s::LcdColorTestNum=%d", __func__, s_lcd.count.load());
     s_lcd.count = mmi_lcd_colour_table(colornum, itemMmi, s_lcd.table);
+    s_lcd.tableSize = atoi(colornum) == MMI_LCD_MAX_COLOURS ? MMI_LCD_MAX_COLOURS : 5;
     return 0;
 }
 

@@ -117,6 +117,8 @@ TEST(LcdColours, SixColoursStartWithExactWhiteThenDarkGray) {
 
 TEST(LcdPc, EachColourRepaintsTheOneWindowAndCloseDestroysIt) {
     Handset h({kLcd});
+    // The operator sees three colours; the PC reaches every colour of the table.
+    h.dut.setConfig("FTX_LCD", "parameter", "colornum:3");
     ASSERT_TRUE(h.start());
     ASSERT_TRUE(h.dut.waitChannel());
     const char *commands[] = {"FFFFFF", "FF0000", "00FF00", "0000FF", "000000"};
