@@ -90,8 +90,12 @@ extern "C" int dev_system(const char *cmd) {
     std::string root = dev_root();
     std::vector<std::string> env;
     for (char **e = environ; *e != nullptr; e++) {
-        if (strncmp(*e, "PATH=", 5) != 0 && strncmp(*e, "FTX_ROOT=", 9) != 0) env.push_back(*e);
+        if (strncmp(*e, "PATH=", 5) != 0 && strncmp(*e, "FTX_ROOT=", 9) != 0 &&
+            strncmp(*e, "FTX_APP_PID=", 12) != 0)
+            env.push_back(*e);
     }
+    // A tool left running in the background ends with the application.
+    env.push_back("FTX_APP_PID=" + std::to_string(getpid()));
     // Only the build's tools are found by name; the root's files never run.
     env.push_back(std::string("PATH=") + tool_dir());
     env.push_back("FTX_ROOT=" + root);

@@ -31,19 +31,14 @@ struct Tool {
 };
 
 const Tool kTools[] = {
-    {"toybox", Kind::Toybox},         {"cat", Kind::FileApplet},
-    {"chmod", Kind::FileApplet},      {"cp", Kind::FileApplet},
-    {"echo", Kind::FileApplet},       {"false", Kind::FileApplet},
-    {"grep", Kind::FileApplet},       {"head", Kind::FileApplet},
-    {"ls", Kind::FileApplet},         {"mkdir", Kind::FileApplet},
-    {"mv", Kind::FileApplet},         {"rm", Kind::FileApplet},
-    {"sleep", Kind::FileApplet},      {"sync", Kind::FileApplet},
-    {"tail", Kind::FileApplet},       {"touch", Kind::FileApplet},
-    {"true", Kind::FileApplet},       {"wc", Kind::FileApplet},
-    {"dhcpcd", Kind::Recorder},       {"dhcptool", Kind::Recorder},
-    {"insmod", Kind::Recorder},       {"iwpriv", Kind::Recorder},
-    {"mmi_open_fb1", Kind::Recorder}, {"ptt_socket_app", Kind::Recorder},
-    {"rmmod", Kind::Recorder},
+    {"toybox", Kind::Toybox},    {"cat", Kind::FileApplet},          {"chmod", Kind::FileApplet},
+    {"cp", Kind::FileApplet},    {"echo", Kind::FileApplet},         {"false", Kind::FileApplet},
+    {"grep", Kind::FileApplet},  {"head", Kind::FileApplet},         {"ls", Kind::FileApplet},
+    {"mkdir", Kind::FileApplet}, {"mv", Kind::FileApplet},           {"rm", Kind::FileApplet},
+    {"sleep", Kind::FileApplet}, {"sync", Kind::FileApplet},         {"tail", Kind::FileApplet},
+    {"touch", Kind::FileApplet}, {"true", Kind::FileApplet},         {"wc", Kind::FileApplet},
+    {"dhcpcd", Kind::Recorder},  {"dhcptool", Kind::Recorder},       {"insmod", Kind::Recorder},
+    {"iwpriv", Kind::Recorder},  {"ptt_socket_app", Kind::Recorder}, {"rmmod", Kind::Recorder},
 };
 
 const char kSelf[] = "ftx-handset";

@@ -41,10 +41,18 @@ std::string absolute_paths(const std::string &line) {
     std::string file = line.substr(cmd.size());
     while (!file.empty() && file[0] == ' ')
         file.erase(0, 1);
+    std::string aux;
+    const std::string auxOption = "--aux ";
+    if (file.compare(0, auxOption.size(), auxOption) == 0) {
+        aux = auxOption;
+        file.erase(0, aux.size());
+        while (!file.empty() && file[0] == ' ')
+            file.erase(0, 1);
+    }
     if (file.empty() || file[0] == '/') return line;
     char cwd[PATH_MAX];
     if (getcwd(cwd, sizeof(cwd)) == nullptr) return line;
-    return cmd + cwd + "/" + file;
+    return cmd + aux + cwd + "/" + file;
 }
 
 // Sends one line and copies the reply to stdout; returns 0 for OK, 2 for KO, 1 on a lost link.

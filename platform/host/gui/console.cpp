@@ -15,6 +15,7 @@
 
 #include <android/log.h>
 
+#include "aux_fb.h"
 #include "console_parse.h"
 #include "devfs.h"
 #include "ftx_host.h"
@@ -77,7 +78,7 @@ int do_tap(const ConsoleRequest &r, std::string &, std::string &why) {
 }
 
 int do_screenshot(const ConsoleRequest &r, std::string &out, std::string &why) {
-    if (ftx_gui_screenshot(r.text) != 0) {
+    if ((r.a == 1 ? aux_screenshot(r.text) : ftx_gui_screenshot(r.text)) != 0) {
         why = std::string("cannot write ") + r.text;
         return -1;
     }
@@ -107,6 +108,10 @@ int do_screen(const ConsoleRequest &, std::string &out, std::string &) {
     char line[256];
     snprintf(line, sizeof(line), "size %dx%d\nblank %d\nbrightness %d\ndisplay %s\ninput %s\n",
              g_fbW, g_fbH, blank, bright, ftx_gui_backend(), ial_running() ? "running" : "stopped");
+    out += line;
+    const ftxhost::AuxFrame aux = aux_frame();
+    snprintf(line, sizeof(line), "aux size %dx%d\naux %s\n", aux.width, aux.height,
+             aux.on ? "on" : "off");
     out += line;
     return 0;
 }

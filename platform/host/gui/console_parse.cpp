@@ -136,10 +136,13 @@ int parse_tap(const Words &w, ConsoleRequest *req, char *why, size_t size) {
 }
 
 int parse_screenshot(const Words &w, ConsoleRequest *req, char *why, size_t size) {
-    if (w.count != 2) return fail(why, size, "usage: screenshot FILE.png"), -1;
-    if (w.n[1] >= sizeof(req->text)) return fail(why, size, "path too long"), -1;
-    memcpy(req->text, w.p[1], w.n[1]);
-    req->text[w.n[1]] = '\0';
+    const bool aux = w.count == 3 && word_is(w, 1, "--aux");
+    if (w.count != 2 && !aux) return fail(why, size, "usage: screenshot [--aux] FILE.png"), -1;
+    const int file = aux ? 2 : 1;
+    if (w.n[file] >= sizeof(req->text)) return fail(why, size, "path too long"), -1;
+    req->a = aux ? 1 : 0;
+    memcpy(req->text, w.p[file], w.n[file]);
+    req->text[w.n[file]] = '\0';
     return 0;
 }
 
@@ -179,9 +182,11 @@ const Command kCommands[] = {
      "touch down|move|up X Y   the finger on the panel (screen pixels)"},
     {"tap", CON_TAP, parse_tap, "tap X Y                  touch down and up at one point"},
     {"screenshot", CON_SCREENSHOT, parse_screenshot,
-     "screenshot FILE.png      the picture as shown (host path)"},
+     "screenshot [--aux] FILE.png  the picture as shown (host path); --aux: the auxiliary "
+     "display"},
     {"windows", CON_WINDOWS, parse_bare, "windows                  main windows, top first"},
-    {"screen", CON_SCREEN, parse_bare, "screen                   size, blank and brightness"},
+    {"screen", CON_SCREEN, parse_bare,
+     "screen                   size, blank, brightness and the auxiliary display"},
     {"idle", CON_IDLE, parse_idle,
      "idle [MS]                wait until input and windows have nothing left to do"},
     {"hw", CON_HW, parse_hw, "hw LINE                  a line for the simulated hardware"},

@@ -16,6 +16,7 @@
 #include <android/log.h>
 
 #include "devfs.h"
+#include "ftx_host.h"
 #include "gui_internal.h"
 #include "minigui/ftx_gui.h"
 #include "tp_os.h"
@@ -229,6 +230,46 @@ void present_copy(std::vector<Uint32> &out) {
         memcpy(out.data(), g_fb, n * sizeof(Uint32));
 }
 
+int write_png(const char *path, int width, int height, const Uint32 *pixels) {
+    const size_t n = static_cast<size_t>(width) * static_cast<size_t>(height);
+    std::vector<png_byte> rgb(n * 3);
+    for (size_t i = 0; i < n; i++) {
+        rgb[i * 3] = static_cast<png_byte>(pixels[i] >> 16);
+        rgb[i * 3 + 1] = static_cast<png_byte>(pixels[i] >> 8);
+        rgb[i * 3 + 2] = static_cast<png_byte>(pixels[i]);
+    }
+    png_image img;
+    memset(&img, 0, sizeof(img));
+    img.version = PNG_IMAGE_VERSION;
+    img.width = static_cast<png_uint_32>(width);
+    img.height = static_cast<png_uint_32>(height);
+    img.format = PNG_FORMAT_RGB;
+    if (png_image_write_to_file(&img, path, 0, rgb.data(), 0, nullptr) == 0) {
+        __android_log_print(ANDROID_LOG_ERROR, kTag, "screenshot %s: %s", path, img.message);
+        return -1;
+    }
+    return 0;
+}
+
+ftxhost::AuxFrame aux_frame() {
+    ftxhost::AuxFrame f;
+    char path[4096];
+    if (dev_path(ftxhost::kAuxFbDevicePath, path, sizeof(path)) == 0 &&
+        ftxhost::aux_fb_read(path, &f) == 0)
+        return f;
+    int w = ftx_device_ini_get_int("aux_screen", "width", ftxhost::kAuxFbDefaultWidth);
+    int h = ftx_device_ini_get_int("aux_screen", "height", ftxhost::kAuxFbDefaultHeight);
+    if (w <= 0 || w > ftxhost::kAuxFbMaxSide) w = ftxhost::kAuxFbDefaultWidth;
+    if (h <= 0 || h > ftxhost::kAuxFbMaxSide) h = ftxhost::kAuxFbDefaultHeight;
+    return ftxhost::aux_fb_plain(w, h, false, 0);
+}
+
+int aux_screenshot(const char *path) {
+    if (path == nullptr) return -1;
+    const ftxhost::AuxFrame f = aux_frame();
+    return write_png(path, f.width, f.height, f.pixels.data());
+}
+
 }  // namespace ftxgui
 
 using namespace ftxgui;
@@ -297,23 +338,7 @@ int ftx_gui_screenshot(const char *path) {
     if (path == nullptr || g_fb == nullptr) return -1;
     std::vector<Uint32> frame;
     present_copy(frame);
-    std::vector<png_byte> rgb(frame.size() * 3);
-    for (size_t i = 0; i < frame.size(); i++) {
-        rgb[i * 3] = static_cast<png_byte>(frame[i] >> 16);
-        rgb[i * 3 + 1] = static_cast<png_byte>(frame[i] >> 8);
-        rgb[i * 3 + 2] = static_cast<png_byte>(frame[i]);
-    }
-    png_image img;
-    memset(&img, 0, sizeof(img));
-    img.version = PNG_IMAGE_VERSION;
-    img.width = static_cast<png_uint_32>(g_fbW);
-    img.height = static_cast<png_uint_32>(g_fbH);
-    img.format = PNG_FORMAT_RGB;
-    if (png_image_write_to_file(&img, path, 0, rgb.data(), 0, nullptr) == 0) {
-        __android_log_print(ANDROID_LOG_ERROR, kTag, "screenshot %s: %s", path, img.message);
-        return -1;
-    }
-    return 0;
+    return write_png(path, g_fbW, g_fbH, frame.data());
 }
 
 }  // extern "C"

@@ -10,6 +10,7 @@
 #include <string>
 #include <vector>
 
+#include "aux_fb.h"
 #include "minigui/common.h"
 #include "minigui/minigui.h"
 #include "minigui/gdi.h"
@@ -141,6 +142,12 @@ extern std::atomic<unsigned> g_fbSerial;  // bumped by every drawing call
 void display_init();
 void display_dim_state(int *blank, int *brightness);
 void present_copy(std::vector<Uint32> &out);  // the shown picture, dimmed
+// Writes pixels (0x00RRGGBB) as an RGB PNG; 0 or -1 (logged).
+int write_png(const char *path, int width, int height, const Uint32 *pixels);
+// The auxiliary display as its program left it (dark, of the configured size, when it
+// never ran), and its picture as a PNG.
+ftxhost::AuxFrame aux_frame();
+int aux_screenshot(const char *path);
 
 // A device context: an origin and a clip region in screen coordinates plus attributes.
 constexpr uint32_t kDcMagic = 0x4844430A;
