@@ -12,6 +12,7 @@
 #include <mutex>
 #include <string>
 
+#include "kernel_files.h"
 #include "root_check.h"
 #include "tp_os.h"
 
@@ -59,6 +60,7 @@ extern "C" int tp_os_thread_init(int argc, char **argv) {
     (void)argc;
     (void)argv;
     ftxhost::require_writable_root();
+    ftxhost::write_boot_kernel_files();
     // Semaphore 0 always exists: the main thread parks on it.
     tp_os_sema_create(0, 0);
     return 0;

@@ -63,8 +63,16 @@ extern "C" int ftx_api_LCD_Get_Info(int *width, int *height, int *bpp) {
     if (bpp != nullptr) *bpp = g_ptScreenInfo.bpp;
     return rc;
 }
-SIM_PLAIN(ftx_api_LCD_Off)
-SIM_INT(ftx_api_LCD_Refresh, arg)
+extern "C" int ftx_api_LCD_Off(void) {
+    int rc = call("ftx_api_LCD_Off", 0);
+    if (rc == 0) model().set_lcd(false);
+    return rc;
+}
+extern "C" int ftx_api_LCD_Refresh(int arg) {
+    int rc = call("ftx_api_LCD_Refresh", 0, "arg=%d", arg);
+    if (rc == 0) model().set_lcd(true);
+    return rc;
+}
 extern "C" int ftx_api_ftx_mode_init(int mode) {
     // The library starts here: a write cut short by a kill in an earlier run left its
     // temporary behind.
@@ -233,7 +241,9 @@ extern "C" int ftx_api_LEDColorTest_Start(const char *color) {
 }
 SIM_PLAIN(ftx_api_LEDColorTest_Stop)
 extern "C" int ftx_api_Set_LCDBacklight(unsigned int level) {
-    return call("ftx_api_Set_LCDBacklight", 0, "%u", level);
+    int rc = call("ftx_api_Set_LCDBacklight", 0, "%u", level);
+    if (rc == 0) model().set_backlight(level);
+    return rc;
 }
 SIM_CB(ftx_api_HallSensorTest_Start)
 SIM_PLAIN(ftx_api_HallSensorTest_Stop)

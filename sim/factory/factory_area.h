@@ -71,5 +71,6 @@ extern const Area kRadioArea;
 extern const Area kFirmwareArea;
 extern const Area kPcbaArea;
 extern const Area kSensorsArea;
+extern const Area kDisplayArea;
 
 }  // namespace ftxsim

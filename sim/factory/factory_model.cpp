@@ -125,8 +125,8 @@ constinit const Area kCoreArea = {
 // the first an area gives, in the same order: the areas without words stand first so that
 // the force-touch names are matched before any name holding "Loopback".
 const Area *const kAreas[] = {
-    &kSensorsArea, &kPcbaArea,  &kAudioArea, &kTouchArea, &kInfoArea,
-    &kCameraArea,  &kCardsArea, &kRadioArea, &kCoreArea,  &kFirmwareArea,
+    &kSensorsArea, &kPcbaArea,  &kAudioArea, &kTouchArea,    &kInfoArea,    &kCameraArea,
+    &kCardsArea,   &kRadioArea, &kCoreArea,  &kFirmwareArea, &kDisplayArea,
 };
 
 // Events an operation sends by itself when started.
@@ -148,6 +148,8 @@ void print_state(Reply &r) {
     r.add("\nfactory:");
     kCardsArea.state(r);
     kCameraArea.state(r);
+    r.add("\ndisplay:");
+    kDisplayArea.state(r);
     r.add("\n");
 }
 

@@ -29,6 +29,10 @@ class FactoryModel {
     // 0 when the device answers, -1 when the console made it fail.
     int detect(const char *name);
     void firmware(char *buf, size_t size);
+    // The backlight level the library was given (102 ends the backlight test) and the LCD's
+    // power.
+    void set_backlight(unsigned level);
+    void set_lcd(bool on);
 };
 
 FactoryModel &model();
