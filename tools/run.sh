@@ -47,6 +47,10 @@ if [ ! -d "$ROOT/etc" ]; then
   mkdir -p "$ROOT"
   cp -a "$TOP/sim/image/." "$ROOT/"
 fi
+# What the build adds to the image (the calibration pictures), also into an older root.
+if [ -d "$BUILD/image" ]; then
+  cp -a -u "$BUILD/image/." "$ROOT/"
+fi
 mkdir -p "$ROOT/log" "$ROOT/run"
 
 export FTX_ROOT="$ROOT"

@@ -73,6 +73,11 @@ DeviceUnderTest::DeviceUnderTest() {
     char tmpl[] = "/tmp/ftx-dut-XXXXXX";
     root_ = mkdtemp(tmpl);
     fs::copy(sourceDir() + "/sim/image", root_, fs::copy_options::recursive);
+    // What the build adds to the image (the calibration pictures).
+    std::error_code ec;
+    if (fs::is_directory(buildDir() + "/image", ec))
+        fs::copy(buildDir() + "/image", root_,
+                 fs::copy_options::recursive | fs::copy_options::overwrite_existing);
     fs::create_directories(root_ + "/log");
     fs::create_directories(root_ + "/run");
     port_ = free_port();
