@@ -56,11 +56,17 @@ void record(const std::string &root, int argc, char **argv) {
     fclose(f);
 }
 
-// True when pid is a running mmi_open_fb1.
+// True when pid is a running mmi_open_fb1. One that has ended but was not reaped yet (its
+// parent, the shell, is gone) counts as ended.
 bool is_display_program(pid_t pid) {
-    std::ifstream comm("/proc/" + std::to_string(pid) + "/comm");
-    std::string name;
-    return std::getline(comm, name) && name == kName;
+    std::ifstream in("/proc/" + std::to_string(pid) + "/stat");
+    std::string stat;
+    if (!std::getline(in, stat)) return false;
+    const size_t open = stat.find('('), close = stat.rfind(')');
+    if (open == std::string::npos || close == std::string::npos || close + 2 >= stat.size())
+        return false;
+    const char state = stat[close + 2];
+    return stat.substr(open + 1, close - open - 1) == kName && state != 'Z' && state != 'X';
 }
 
 // Ends an earlier instance that still shows its colour.
@@ -68,11 +74,12 @@ void replace_earlier(const std::string &pidFile) {
     std::ifstream in(pidFile);
     long pid = 0;
     if (!(in >> pid) || pid <= 1 || pid == getpid()) return;
-    if (!is_display_program(static_cast<pid_t>(pid))) return;
-    kill(static_cast<pid_t>(pid), SIGTERM);
-    for (int i = 0; i < 100 && kill(static_cast<pid_t>(pid), 0) == 0; i++)
+    const pid_t earlier = static_cast<pid_t>(pid);
+    if (!is_display_program(earlier)) return;
+    kill(earlier, SIGTERM);
+    for (int i = 0; i < 100 && is_display_program(earlier); i++)
         sleep_ms(kPollMs);
-    if (kill(static_cast<pid_t>(pid), 0) == 0) kill(static_cast<pid_t>(pid), SIGKILL);
+    if (is_display_program(earlier)) kill(earlier, SIGKILL);
 }
 
 int number(const char *s, long lo, long hi, long *out) {

@@ -283,4 +283,110 @@ TEST(AuxLcdRun, BothLcdPassesRunAcrossTheRestartBetweenThem) {
     EXPECT_EQ(1, h.result(280));
 }
 
+TEST(LcdPc, ThePanelTypeComesFromTheImage) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    auto r = h.dut.pc("LCDType testItem read");
+    EXPECT_EQ(0, r.first);
+    EXPECT_EQ("JDI", r.second);
+    h.dut.stop();
+    std::string ini = h.dut.read("/sim/device.ini");
+    ini.replace(ini.find("type=JDI"), 8, "type=Truly");
+    h.dut.write("/sim/device.ini", ini);
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    r = h.dut.pc("LCDType testItem read");
+    EXPECT_EQ(0, r.first);
+    EXPECT_EQ("Truly", r.second);
+}
+
+TEST(LcdPc, TheBacklightLevelReachesTheModelAndTheEndGivesTheBrightnessBack) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    ASSERT_EQ(0, h.dut.pc("LCDbacklightMoudle testItem 40").first);
+    EXPECT_NE(std::string::npos, h.dut.console("hw status").find("display: backlight=40 lcd=on"));
+    EXPECT_EQ("40\n", h.dut.read("/sys/class/leds/lcd-backlight/brightness"));
+    ASSERT_EQ(0, h.dut.pc("LCDbacklightTestMoudle testItem close").first);
+    EXPECT_NE(std::string::npos, h.dut.console("hw status").find("display: backlight=end"));
+    EXPECT_EQ("255\n", h.dut.read("/sys/class/leds/lcd-backlight/brightness"));
+}
+
+// The picture's own colour at the screen's left edge (the first stripe is coloured).
+bool picture(const Png &p, Colour stripe) {
+    const unsigned char *edge = p.at(4, 100), *middle = p.at(360, 640);
+    return edge[0] == stripe.r && edge[1] == stripe.g && edge[2] == stripe.b && middle[0] == 255 &&
+           middle[1] == 255 && middle[2] == 255;
+}
+
+TEST(LcdPictures, ShowImageDrawsTheNumberedPictureUntilClose) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    EXPECT_EQ(2, h.dut.pc("commonModule testItem showImage").first);
+    EXPECT_EQ(0, fullScreenWindows(h));
+
+    ASSERT_EQ(0, h.dut.pc("commonModule testItem showImage 10").first);
+    EXPECT_TRUE(h.dut.waitLog("showPictureByIndex /vendor/etc/data/ratio_25_0010.png"));
+    h.shotWhen("calibration_picture.png", [](const Png &p) { return picture(p, {220, 40, 150}); });
+    ASSERT_EQ(0, h.dut.pc("commonModule testItem showImage 9").first);
+    EXPECT_TRUE(h.dut.waitLog("showPictureByIndex /vendor/etc/data/ratio_25_0009.png"));
+    h.shotWhen("calibration_picture_9.png", [](const Png &p) {
+        return picture(p, {180, 50, 210});
+    });
+    EXPECT_EQ(1, fullScreenWindows(h));
+    // Touches leave a picture alone.
+    tap(h);
+    ASSERT_TRUE(h.dut.waitLog(kTouchIgnored));
+    ASSERT_EQ(0, h.dut.pc("commonModule testItem close").first);
+    EXPECT_EQ(0, fullScreenWindows(h));
+}
+
+// The auxiliary display, as a picture.
+Png auxShot(Handset &h, const std::string &name) {
+    const std::string path = h.dut.root() + "/" + name;
+    EXPECT_TRUE(h.dut.consoleOk("screenshot --aux " + path));
+    Png png;
+    EXPECT_TRUE(png.load(path));
+    h.keepForDocs(name, name);
+    return png;
+}
+
+TEST(AuxDisplay, ColourCommandsPaintTheSecondDisplayAndCloseEndsItsProgram) {
+    Handset h({kLcd});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    EXPECT_NE(std::string::npos, h.dut.console("screen").find("aux size 240x320\naux off"));
+    const char *commands[] = {"FFFFFF", "FF0000", "00FF00", "0000FF", "000000"};
+    for (int i = 0; i < 5; i++) {
+        SCOPED_TRACE(commands[i]);
+        ASSERT_EQ(0, h.dut.pc(std::string("LCDMoudle testItem ") + commands[i] + " aux").first);
+        EXPECT_TRUE(dut_wait_until(
+            [&] {
+                Png p = auxShot(h, "aux_display.png");
+                return p.w == 240 && p.h == 320 && filled(p, kFive[i]);
+            },
+            5000));
+        if (i == 1) h.keepForDocs("aux_display.png", "aux_display_red.png");
+    }
+    EXPECT_NE(std::string::npos, h.dut.console("screen").find("aux on"));
+    // The main display is not touched.
+    EXPECT_EQ(0, fullScreenWindows(h));
+    ASSERT_EQ(0, h.dut.pc("LCDMoudle testItem close aux").first);
+    EXPECT_TRUE(dut_wait_until(
+        [&] { return h.dut.console("screen").find("aux off") != std::string::npos; }, 5000));
+    // The program took its close flag with it and is gone.
+    EXPECT_TRUE(dut_wait_until([&] { return !h.dut.exists("/run/fb1.pid"); }, 5000));
+    EXPECT_FALSE(h.dut.exists("/data/fb1_close_flag"));
+    EXPECT_TRUE(filled(auxShot(h, "aux_display_off.png"), {0, 0, 0}));
+    // One start of the program for each colour, in turn.
+    const std::string tools = h.dut.read("/log/tools.txt");
+    size_t at = 0;
+    for (int i = 0; i < 5; i++) {
+        at = tools.find("mmi_open_fb1 1 " + std::to_string(i) + "\n", at);
+        EXPECT_NE(std::string::npos, at) << i;
+    }
+}
+
 }  // namespace
