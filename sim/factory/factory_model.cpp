@@ -157,12 +157,15 @@ int control_fn(const char *line, char *reply, size_t size) {
     return control(line, reply, size);
 }
 
+// One table of every area's words, kept for the library's life (the core keeps its address)
+// and never destroyed: the worker may still run at exit.
+std::vector<Word> *g_words = nullptr;
+
 __attribute__((constructor)) void register_factory() {
-    // One table of every area's words, kept for the library's life: the core keeps its address.
-    auto *words = new std::vector<Word>;
+    g_words = new std::vector<Word>;
     for (const Area *area : kAreas)
-        words->insert(words->end(), area->words.begin(), area->words.end());
-    add_words(words->data(), words->size(), print_state);
+        g_words->insert(g_words->end(), area->words.begin(), area->words.end());
+    add_words(g_words->data(), g_words->size(), print_state);
     ftx_host_register_hw("factory", control_fn);
 }
 
