@@ -137,7 +137,9 @@ int parse_tap(const Words &w, ConsoleRequest *req, char *why, size_t size) {
 
 int parse_screenshot(const Words &w, ConsoleRequest *req, char *why, size_t size) {
     const bool aux = w.count == 3 && word_is(w, 1, "--aux");
-    if (w.count != 2 && !aux) return fail(why, size, "usage: screenshot [--aux] FILE.png"), -1;
+    // A file name never starts with '-': "screenshot --aux" is a request without its file.
+    const bool plain = w.count == 2 && w.n[1] > 0 && w.p[1][0] != '-';
+    if (!plain && !aux) return fail(why, size, "usage: screenshot [--aux] FILE.png"), -1;
     const int file = aux ? 2 : 1;
     if (w.n[file] >= sizeof(req->text)) return fail(why, size, "path too long"), -1;
     req->a = aux ? 1 : 0;

@@ -6,6 +6,7 @@
 
 #include <string>
 
+#include "aux_fb.h"
 #include "gui_harness.h"
 
 using namespace guitest;
@@ -178,6 +179,43 @@ TEST(Console, RequestsAreCheckedBeforeAnythingHappens) {
         EXPECT_NE(help.find(cmd), std::string::npos) << cmd;
     EXPECT_EQ(con.ask(std::string(5000, 'x')), "KO line too long\n");
     EXPECT_EQ(con.ask("screen").substr(0, 4), "size") << "the connection survives a bad line";
+}
+
+TEST(Console, TheAuxiliaryDisplayIsDarkUntilItsProgramPaintsIt) {
+    Console con;
+    ASSERT_TRUE(con.ok());
+    const TempRoot &root = *GuiEnvironment::root_;
+    root.write("/sim/fb1", "");  // not a frame: the display counts as never painted
+    std::string screen = con.ask("screen");
+    EXPECT_NE(screen.find("\naux size 240x320\naux off\n"), std::string::npos) << screen;
+    const std::string file = root.host("/aux.png");
+    EXPECT_EQ(con.ask("screenshot --aux " + file), file + "\nOK\n");
+    png_image img{};
+    img.version = PNG_IMAGE_VERSION;
+    ASSERT_NE(png_image_begin_read_from_file(&img, file.c_str()), 0);
+    EXPECT_EQ(img.width, 240u);
+    EXPECT_EQ(img.height, 320u);
+    png_image_free(&img);
+
+    // A painted frame, read back pixel for pixel.
+    ftxhost::AuxFrame f = ftxhost::aux_fb_plain(4, 3, true, 0x00FF00);
+    f.pixels[5] = 0x123456;
+    ASSERT_EQ(0, ftxhost::aux_fb_write(root.host("/sim/fb1"), f));
+    EXPECT_NE(con.ask("screen").find("aux size 4x3\naux on\n"), std::string::npos);
+    EXPECT_EQ(con.ask("screenshot --aux " + file), file + "\nOK\n");
+    png_image shot{};
+    shot.version = PNG_IMAGE_VERSION;
+    ASSERT_NE(png_image_begin_read_from_file(&shot, file.c_str()), 0);
+    shot.format = PNG_FORMAT_RGB;
+    std::vector<png_byte> rgb(PNG_IMAGE_SIZE(shot));
+    ASSERT_NE(png_image_finish_read(&shot, nullptr, rgb.data(), 0, nullptr), 0);
+    EXPECT_EQ(rgb[0 * 3 + 1], 0xFF);
+    EXPECT_EQ(rgb[5 * 3], 0x12);
+    EXPECT_EQ(rgb[5 * 3 + 1], 0x34);
+    EXPECT_EQ(rgb[5 * 3 + 2], 0x56);
+
+    EXPECT_EQ(con.ask("screenshot --aux"), "KO usage: screenshot [--aux] FILE.png\n");
+    EXPECT_EQ(con.ask("screenshot --main x.png"), "KO usage: screenshot [--aux] FILE.png\n");
 }
 
 TEST(Console, ReplyIsCutToTheBufferButKeepsItsStatus) {
