@@ -157,15 +157,18 @@ int control_fn(const char *line, char *reply, size_t size) {
     return control(line, reply, size);
 }
 
-// One table of every area's words, kept for the library's life (the core keeps its address)
-// and never destroyed: the worker may still run at exit.
-std::vector<Word> *g_words = nullptr;
+// One table of every area's words, kept for the library's life (the core keeps its address).
+// Plain static storage: nothing to destroy while the worker may still run at exit, and
+// nothing left on the heap when a test unloads the library.
+constexpr size_t kMaxWords = 64;
+Word g_words[kMaxWords];
 
 __attribute__((constructor)) void register_factory() {
-    g_words = new std::vector<Word>;
+    size_t n = 0;
     for (const Area *area : kAreas)
-        g_words->insert(g_words->end(), area->words.begin(), area->words.end());
-    add_words(g_words->data(), g_words->size(), print_state);
+        for (const Word &w : area->words)
+            if (n < kMaxWords) g_words[n++] = w;
+    add_words(g_words, n, print_state);
     ftx_host_register_hw("factory", control_fn);
 }
 
