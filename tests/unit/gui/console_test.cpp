@@ -63,6 +63,31 @@ int see_mouse(void *, HWND, UINT msg, WPARAM, LPARAM lp) {
 
 }  // namespace
 
+namespace {
+
+// A PNG read back as RGB bytes; empty when it cannot be read.
+struct Rgb {
+    png_uint_32 width = 0, height = 0;
+    std::vector<png_byte> bytes;
+};
+Rgb read_rgb(const std::string &file) {
+    Rgb out;
+    png_image img{};
+    img.version = PNG_IMAGE_VERSION;
+    if (png_image_begin_read_from_file(&img, file.c_str()) == 0) return out;
+    img.format = PNG_FORMAT_RGB;
+    out.bytes.resize(PNG_IMAGE_SIZE(img));
+    if (png_image_finish_read(&img, nullptr, out.bytes.data(), 0, nullptr) == 0) {
+        out.bytes.clear();
+        return out;
+    }
+    out.width = img.width;
+    out.height = img.height;
+    return out;
+}
+
+}  // namespace
+
 TEST(Console, ScreenshotIsTheFramebuffer) {
     GuiThread gui;
     ASSERT_TRUE(idle());
@@ -81,14 +106,11 @@ TEST(Console, ScreenshotIsTheFramebuffer) {
     std::string file = GuiEnvironment::root_->host("/shot.png");
     EXPECT_EQ(con.ask("screenshot " + file), file + "\nOK\n");
 
-    png_image img{};
-    img.version = PNG_IMAGE_VERSION;
-    ASSERT_NE(png_image_begin_read_from_file(&img, file.c_str()), 0);
-    img.format = PNG_FORMAT_RGB;
-    std::vector<png_byte> rgb(PNG_IMAGE_SIZE(img));
-    ASSERT_NE(png_image_finish_read(&img, nullptr, rgb.data(), 0, nullptr), 0);
-    ASSERT_EQ(img.width, static_cast<png_uint_32>(kW));
-    ASSERT_EQ(img.height, static_cast<png_uint_32>(kH));
+    const Rgb shot = read_rgb(file);
+    ASSERT_FALSE(shot.bytes.empty());
+    ASSERT_EQ(shot.width, static_cast<png_uint_32>(kW));
+    ASSERT_EQ(shot.height, static_cast<png_uint_32>(kH));
+    const std::vector<png_byte> &rgb = shot.bytes;
     int w, h, differ = 0;
     ftx_gui_lock_framebuffer();
     const Uint32 *fb = ftx_gui_framebuffer(&w, &h);
@@ -104,12 +126,8 @@ TEST(Console, ScreenshotIsTheFramebuffer) {
     GuiEnvironment::root_->write("/sys/class/graphics/fb0/blank", "4\n");
     EXPECT_EQ(con.ask("screenshot " + file), file + "\nOK\n");
     GuiEnvironment::root_->write("/sys/class/graphics/fb0/blank", "0\n");
-    png_image dark{};
-    dark.version = PNG_IMAGE_VERSION;
-    ASSERT_NE(png_image_begin_read_from_file(&dark, file.c_str()), 0);
-    dark.format = PNG_FORMAT_RGB;
-    std::vector<png_byte> black(PNG_IMAGE_SIZE(dark));
-    ASSERT_NE(png_image_finish_read(&dark, nullptr, black.data(), 0, nullptr), 0);
+    const std::vector<png_byte> black = read_rgb(file).bytes;
+    ASSERT_FALSE(black.empty());
     EXPECT_EQ(std::count(black.begin(), black.end(), 0), static_cast<long>(black.size()));
     EXPECT_NE(con.ask("screen").find("blank 0\n"), std::string::npos);
 }
@@ -190,12 +208,10 @@ TEST(Console, TheAuxiliaryDisplayIsDarkUntilItsProgramPaintsIt) {
     EXPECT_NE(screen.find("\naux size 240x320\naux off\n"), std::string::npos) << screen;
     const std::string file = root.host("/aux.png");
     EXPECT_EQ(con.ask("screenshot --aux " + file), file + "\nOK\n");
-    png_image img{};
-    img.version = PNG_IMAGE_VERSION;
-    ASSERT_NE(png_image_begin_read_from_file(&img, file.c_str()), 0);
-    EXPECT_EQ(img.width, 240u);
-    EXPECT_EQ(img.height, 320u);
-    png_image_free(&img);
+    const Rgb dark = read_rgb(file);
+    EXPECT_EQ(dark.width, 240u);
+    EXPECT_EQ(dark.height, 320u);
+    EXPECT_EQ(std::count(dark.bytes.begin(), dark.bytes.end(), 0), (long)dark.bytes.size());
 
     // A painted frame, read back pixel for pixel.
     ftxhost::AuxFrame f = ftxhost::aux_fb_plain(4, 3, true, 0x00FF00);
@@ -203,12 +219,8 @@ TEST(Console, TheAuxiliaryDisplayIsDarkUntilItsProgramPaintsIt) {
     ASSERT_EQ(0, ftxhost::aux_fb_write(root.host("/sim/fb1"), f));
     EXPECT_NE(con.ask("screen").find("aux size 4x3\naux on\n"), std::string::npos);
     EXPECT_EQ(con.ask("screenshot --aux " + file), file + "\nOK\n");
-    png_image shot{};
-    shot.version = PNG_IMAGE_VERSION;
-    ASSERT_NE(png_image_begin_read_from_file(&shot, file.c_str()), 0);
-    shot.format = PNG_FORMAT_RGB;
-    std::vector<png_byte> rgb(PNG_IMAGE_SIZE(shot));
-    ASSERT_NE(png_image_finish_read(&shot, nullptr, rgb.data(), 0, nullptr), 0);
+    const std::vector<png_byte> rgb = read_rgb(file).bytes;
+    ASSERT_EQ(rgb.size(), 4u * 3 * 3);
     EXPECT_EQ(rgb[0 * 3 + 1], 0xFF);
     EXPECT_EQ(rgb[5 * 3], 0x12);
     EXPECT_EQ(rgb[5 * 3 + 1], 0x34);
