@@ -16,6 +16,9 @@
 #include <vector>
 
 #include "shell_line.h"
+#include "tool_record.h"
+
+using ftxhandset::under;
 
 namespace {
 
@@ -62,11 +65,6 @@ std::string real_root() {
     return buf;
 }
 
-bool under(const std::string &path, const std::string &folder) {
-    return path.compare(0, folder.size(), folder) == 0 &&
-           (path.size() == folder.size() || path[folder.size()] == '/');
-}
-
 // True when path, followed through every link that exists so far, stays inside root.
 bool inside_root(const std::string &arg, const std::string &root) {
     char cwd[PATH_MAX];
@@ -83,30 +81,6 @@ bool inside_root(const std::string &arg, const std::string &root) {
         rest = path.substr(slash) + rest;
         path = slash == 0 ? "/" : path.substr(0, slash);
     }
-}
-
-// The device path of a host path inside the root, for the record.
-std::string device_words(int argc, char **argv) {
-    const char *env = getenv("FTX_ROOT");
-    std::string root = env != nullptr ? env : "";
-    std::string out;
-    for (int i = 0; i < argc; i++) {
-        std::string a = argv[i];
-        if (!root.empty() && under(a, root)) a = a.substr(root.size());
-        out += " " + (a.empty() ? std::string("/") : a);
-    }
-    return out;
-}
-
-void record(const std::string &name, int argc, char **argv) {
-    const char *root = getenv("FTX_ROOT");
-    if (root == nullptr || root[0] == '\0') return;
-    std::string dir = std::string(root) + "/log";
-    mkdir(dir.c_str(), 0755);
-    FILE *f = fopen((dir + "/tools.txt").c_str(), "a");
-    if (f == nullptr) return;
-    fprintf(f, "%s%s\n", name.c_str(), device_words(argc, argv).c_str());
-    fclose(f);
 }
 
 int sync_root(const std::string &root) {
@@ -193,7 +167,7 @@ int main(int argc, char **argv) {
         fprintf(stderr, "%s: not a handset tool\n", name.c_str());
         return 127;
     }
-    record(name, argc - 1, argv + 1);
+    ftxhandset::record(name, argc - 1, argv + 1);
     switch (tool->kind) {
         case Kind::Toybox: {
             if (argc < 2) return 0;

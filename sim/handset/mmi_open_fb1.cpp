@@ -18,6 +18,7 @@
 
 #include "aux_fb.h"
 #include "kv_file.h"
+#include "tool_record.h"
 
 namespace {
 
@@ -43,17 +44,6 @@ void sleep_ms(long ms) {
 bool exists(const std::string &path) {
     struct stat st;
     return stat(path.c_str(), &st) == 0;
-}
-
-void record(const std::string &root, int argc, char **argv) {
-    mkdir((root + "/log").c_str(), 0755);
-    FILE *f = fopen((root + "/log/tools.txt").c_str(), "a");
-    if (f == nullptr) return;
-    fputs(kName, f);
-    for (int i = 1; i < argc; i++)
-        fprintf(f, " %s", argv[i]);
-    fputc('\n', f);
-    fclose(f);
 }
 
 // True when pid is a running mmi_open_fb1. One that has ended but was not reaped yet (its
@@ -130,7 +120,7 @@ int main(int argc, char **argv) {
         return 127;
     }
     const std::string root = real;
-    record(root, argc, argv);
+    ftxhandset::record(kName, argc - 1, argv + 1);
 
     signal(SIGTERM, on_term);
     const std::string pidFile = root + kPidFile, flag = root + kCloseFlag,

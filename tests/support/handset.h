@@ -142,6 +142,13 @@ inline constexpr char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not av
 inline bool light(int r, int g, int b) {
     return r > 150 && g > 150 && b > 150;
 }
+// The soft-key bar of a 720x1280 screen shows its pass (left) or fail (right) label.
+inline bool pass_label(const Png &p) {
+    return p.count(0, 1185, 240, 1280, light) > 20;
+}
+inline bool fail_label(const Png &p) {
+    return p.count(480, 1185, 720, 1280, light) > 20;
+}
 inline bool green(int r, int g, int b) {
     return g > 150 && r < 100 && b < 100;
 }
@@ -215,9 +222,10 @@ class Handset {
                         std::to_string(value) + ",write");
         EXPECT_EQ(0, r.first);
     }
-    Png shot(const std::string &name) {
+    // The main display, or with aux the auxiliary one.
+    Png shot(const std::string &name, bool aux = false) {
         std::string path = dut.root() + "/" + name;
-        EXPECT_TRUE(dut.consoleOk("screenshot " + path));
+        EXPECT_TRUE(dut.consoleOk(std::string("screenshot ") + (aux ? "--aux " : "") + path));
         Png png;
         EXPECT_TRUE(png.load(path));
         keepForDocs(name, name);

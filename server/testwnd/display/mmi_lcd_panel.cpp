@@ -4,6 +4,7 @@
 #include <dlfcn.h>
 #include <errno.h>
 #include <fcntl.h>
+#include <stdarg.h>
 #include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
@@ -36,16 +37,13 @@ int copy_register(const char *name, const char *suffix, int length) {
     return 1;
 }
 
-int default_register(const char *name) {
+// Builds a shell line from its words and runs it through the device shell.
+__attribute__((format(printf, 1, 2))) void run_line(const char *fmt, ...) {
     char line[kLineSize];
-    snprintf(line, sizeof(line), "echo > /proc/panel_hue_dll_%s_switch", name);
-    dev_system(line);
-    return 1;
-}
-
-void run_line(const char *fmt, const char *arg) {
-    char line[kLineSize];
-    snprintf(line, sizeof(line), fmt, arg);
+    va_list ap;
+    va_start(ap, fmt);
+    vsnprintf(line, sizeof(line), fmt, ap);
+    va_end(ap);
     dev_system(line);
 }
 
@@ -91,9 +89,7 @@ int mmi_AutoTest_Hue_Set(const char *parm, int, char *, unsigned int) {
         LCD_ERROR("%s: refused \"%s\"", __func__, parm);
         return 0;
     }
-    char line[kLineSize];
-    snprintf(line, sizeof(line), "echo %s > /proc/panel_hue_%s_switch", x.f[1], x.f[0]);
-    dev_system(line);
+    run_line("echo %s > /proc/panel_hue_%s_switch", x.f[1], x.f[0]);
     return 1;
 }
 
@@ -110,7 +106,10 @@ int mmi_AutoTest_Hue_Register_Set(const char *parm, int, char *, unsigned int) {
     }
     const bool truly = strcmp(panel, "truly") == 0, jdi = strcmp(panel, "jdi") == 0;
     if (!truly && !jdi) return 0;
-    if (strcmp(action, "default") == 0) return default_register(name);
+    if (strcmp(action, "default") == 0) {
+        run_line("echo > /proc/panel_hue_dll_%s_switch", name);
+        return 1;
+    }
     if (strcmp(action, "reg") != 0) return 0;
     if (truly) return copy_register(name, "", 256);
     return copy_register(name, "", 1024) && copy_register(name, "1", 1024) ? 1 : 0;
@@ -163,9 +162,7 @@ int mmi_AutoTest_LCDRefresh(int arg) {
 }
 
 int mmi_AutoTest_AUX_LCDColorTestEntry(int index) {
-    char line[kLineSize];
-    snprintf(line, sizeof(line), "mmi_open_fb1 1 %d &", index);
-    dev_system(line);
+    run_line("mmi_open_fb1 1 %d &", index);
     return 1;
 }
 
@@ -180,7 +177,7 @@ int mmi_AutoTest_Switch_Display(const char *parm, int, char *, unsigned int) {
     LCD_DEBUG("%s %s", __func__, parm != nullptr ? parm : "");
     if (!main && !aux) return 0;
     // The main display is kept black while the auxiliary one is in use.
-    run_line(main ? "echo 1 > %s" : "echo 0 > %s", kTouchMainCtrl);
-    run_line(main ? "rm -f %s" : "touch %s", kFb0BlackFlag);
+    run_line("echo %d > %s", main ? 1 : 0, kTouchMainCtrl);
+    run_line("%s %s", main ? "rm -f" : "touch", kFb0BlackFlag);
     return 1;
 }

@@ -118,19 +118,19 @@ void paint(HWND hWnd, ColourScreen *s) {
     LCD_DEBUG(s->tag, "%s MSG_PAINT begin", __func__);
     HDC hdc = BeginPaint(hWnd);
     LCD_DEBUG(s->tag, "%s MSG_PAINT hdc=%x", __func__, (unsigned)(uintptr_t)hdc);
-    if (s->preview && s->pictureMode) {
+    // The colour at the index moves on only when a new colour was asked for; a picture
+    // never moves it.
+    const bool picture = s->preview && s->pictureMode;
+    const bool next = !picture && s->nextColour.exchange(false);
+    if (picture) {
         showPictureByIndex(hdc, s->pictureIndex.load());
-        EndPaint(hWnd, hdc);
-        LCD_DEBUG(s->tag, "%s MSG_PAINT end", __func__);
-        return;
+    } else {
+        uint64_t i = s->index.load();
+        if (!next && i > 0) i--;
+        const int last = s->tableSize.load() - 1;
+        SetBrushColor(hdc, s->table[i > (uint64_t)last ? last : i]);
+        FillBox(hdc, 0, 0, g_ptScreenInfo.width, g_ptScreenInfo.height);
     }
-    // The colour at the index moves on only when a new colour was asked for.
-    const bool next = s->nextColour.exchange(false);
-    uint64_t i = s->index.load();
-    if (!next && i > 0) i--;
-    const int last = s->tableSize.load() - 1;
-    SetBrushColor(hdc, s->table[i > (uint64_t)last ? last : i]);
-    FillBox(hdc, 0, 0, g_ptScreenInfo.width, g_ptScreenInfo.height);
     EndPaint(hWnd, hdc);
     if (next && !s->preview) start_fool_proof(s);
     LCD_DEBUG(s->tag, "%s MSG_PAINT end", __func__);
@@ -231,8 +231,9 @@ HWND create_colour_window(ColourScreen *s) {
 }
 
 void fill_preview_table(void) {
-    s_preview.count = mmi_lcd_monomer_table(s_preview.table);
-    s_preview.tableSize = s_preview.count.load();
+    const int n = mmi_lcd_monomer_table(s_preview.table);
+    s_preview.count = n;
+    s_preview.tableSize = n;
 }
 
 // On the GUI thread: opens the screen, or repaints it when the PC opened it already.
@@ -294,21 +295,21 @@ int close_check(void) {
 
 // ---- tables ----
 
-int mmi_lcd_colour_table(const char *colornum, int itemMmi, uint32_t *out) {
+int mmi_lcd_colour_table(const char *colornum, int itemMmi, uint32_t *out, int *size) {
     const int n = colornum != nullptr ? atoi(colornum) : 5;
-    if (n == 6) {
+    int filled = MMI_LCD_MAX_COLOURS;
+    if (n == MMI_LCD_MAX_COLOURS) {
         const int six[] = {MMI_COLOUR_LIGHT_WHITE, MMI_COLOUR_DARK_GRAY, MMI_COLOUR_PURE_RED,
                            MMI_COLOUR_PURE_GREEN,  MMI_COLOUR_PURE_BLUE, MMI_COLOUR_BLACK};
-        for (int i = 0; i < 6; i++)
+        for (int i = 0; i < MMI_LCD_MAX_COLOURS; i++)
             out[i] = mmi_pixel(six[i]);
     } else {
-        mmi_lcd_monomer_table(out);
+        filled = mmi_lcd_monomer_table(out);
     }
+    if (size != nullptr) *size = filled;
     // Never more colours than the table holds, and at least one.
-    int count = n < 1 ? 1 : (n > MMI_LCD_MAX_COLOURS ? MMI_LCD_MAX_COLOURS : n);
-    if (n != 6 && count > 5) count = 5;
-    if (itemMmi == 2) count = 1;
-    return count;
+    const int count = n < 1 ? 1 : (n > filled ? filled : n);
+    return itemMmi == 2 ? 1 : count;
 }
 
 int mmi_lcd_monomer_table(uint32_t *out) {
@@ -350,10 +351,10 @@ int mmi_LCDColorTest_Init(void) {
     } else {
         tp_os_strlcpy(colornum, "5", sizeof(colornum));
     }
-    s_lcd.count = atoi(colornum);
-    LCD_DEBUG(s_lcd.tag, "%s::LcdColorTestNum=%d", __func__, s_lcd.count.load());
-    s_lcd.count = mmi_lcd_colour_table(colornum, itemMmi, s_lcd.table);
-    s_lcd.tableSize = atoi(colornum) == MMI_LCD_MAX_COLOURS ? MMI_LCD_MAX_COLOURS : 5;
+    LCD_DEBUG(s_lcd.tag, "%s::LcdColorTestNum=%d", __func__, atoi(colornum));
+    int size = 0;
+    s_lcd.count = mmi_lcd_colour_table(colornum, itemMmi, s_lcd.table, &size);
+    s_lcd.tableSize = size;
     return 0;
 }
 

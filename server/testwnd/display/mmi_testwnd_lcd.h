@@ -30,8 +30,9 @@ int mmi_AutoTest_PW_ShowPicture(int index);
 int mmi_AutoTest_PW_ShowPicture_Close(void);
 
 // The colour table for a "colornum" value and the item's `mmi` flag: fills `out` (room for
-// MMI_LCD_MAX_COLOURS) from the system palette and returns how many colours are shown.
-int mmi_lcd_colour_table(const char *colornum, int itemMmi, uint32_t *out);
+// MMI_LCD_MAX_COLOURS) from the system palette, tells how many entries it filled (5 or 6)
+// when `size` is given, and returns how many colours the operator is shown.
+int mmi_lcd_colour_table(const char *colornum, int itemMmi, uint32_t *out, int *size = nullptr);
 // The preview's five colours.
 int mmi_lcd_monomer_table(uint32_t *out);
 // The device path of calibration picture `index` (four digits for 0 to 99).

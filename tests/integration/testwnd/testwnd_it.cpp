@@ -29,13 +29,6 @@ long log_ms(const std::string &log, const std::string &text) {
     return ((hh * 60L + mm) * 60L + ss) * 1000L + ms;
 }
 
-bool pass_label(const Png &p) {
-    return p.count(0, 1185, 240, 1280, light) > 20;
-}
-bool fail_label(const Png &p) {
-    return p.count(480, 1185, 720, 1280, light) > 20;
-}
-
 TEST(TestWindow, PassLabelShowsOnlyAfterTheFoolProofDelay) {
     using Clock = std::chrono::steady_clock;
     const auto kDelay = std::chrono::milliseconds(3000);  // the vibrator's, at time scale 1
