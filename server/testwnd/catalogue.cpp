@@ -9,12 +9,14 @@
 #include "pending/cards.h"
 #include "testwnd/display/mmi_testwnd_auxlcdhint.h"
 #include "testwnd/display/mmi_testwnd_lcd.h"
-#include "pending/keys.h"
+#include "testwnd/keys/mmi_testwnd_hookkey.h"
+#include "testwnd/keys/mmi_testwnd_keys.h"
 #include "pending/misc.h"
 #include "pending/sensors.h"
-#include "pending/touch.h"
 #include "testwnd/misc/mmi_testwnd_hardversion.h"
 #include "testwnd/misc/mmi_testwnd_vibrator.h"
+#include "testwnd/touch/mmi_testwnd_touch.h"
+#include "testwnd/touch/mmi_testwnd_tpself.h"
 
 namespace {
 

@@ -4,6 +4,7 @@
 #include <errno.h>
 #include <signal.h>
 #include <stdint.h>
+#include <stdlib.h>
 #include <string.h>
 #include <time.h>
 
@@ -14,6 +15,7 @@
 #include <android/log.h>
 
 #include "core/ftx_config.h"
+#include "session/mmi_testitem.h"
 #include "mmi_bars.h"
 #include "minigui/control.h"
 #include "mmi_guithread.h"
@@ -170,6 +172,16 @@ HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
     return hWnd;
 }
 
+void mmi_testwnd_create_title(HWND hWnd, const char *titleKey) {
+    char title[MMI_TESTWND_TEXT_SIZE];
+    mmi_translate(titleKey, title, sizeof(title));
+    HWND ctrl =
+        CreateWindowEx(CTRL_STATIC, title, WS_VISIBLE | WS_BORDER | SS_CENTER | SS_NOPREFIX,
+                       WS_EX_NONE, MMI_TESTWND_TITLE_ID, 0, 0, g_ptScreenInfo.width, 0, hWnd, 0);
+    if (g_mmiLogFont[1] && ctrl != HWND_INVALID) SetWindowFont(ctrl, g_mmiLogFont[1]);
+    if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
+}
+
 void mmi_testwnd_draw_top_line(HDC hdc) {
     SetPenColor(hdc, mmi_pixel(MMI_COLOUR_PASS));
     SetPenWidth(hdc, 3);
@@ -184,20 +196,92 @@ void mmi_testwnd_rect(int w, int h, RECT *out) {
     out->bottom = h - (h / 15 + 10);
 }
 
-void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam) {
-    char pass[MMI_TESTWND_TEXT_SIZE], fail[MMI_TESTWND_TEXT_SIZE], title[MMI_TESTWND_TEXT_SIZE];
-    mmi_translate("Result_pass", pass, sizeof(pass));
-    mmi_translate("Result_fail", fail, sizeof(fail));
-    mmi_translate(titleKey, title, sizeof(title));
+void mmi_testwnd_set_bars(HWND hWnd, const char *titleKey, const char *left, const char *middle,
+                          const char *right) {
     tp_skb_set_text_col(MMI_COLOUR_TEXT);
-    if (wParam == MMI_TIMER_FOOLPROOF) {
-        tp_skb_set_text_items(hWnd, pass, "", fail);
-    } else {
-        tp_skb_set_text_items(hWnd, "", "", fail);
-    }
+    tp_skb_set_text_items(hWnd, left, middle, right);
     tp_skb_update(hWnd);
+    if (titleKey == nullptr) return;
+    // The strip keeps a record per window: this one's is made first.
+    if (!tp_batteryshow_has_items(hWnd)) tp_batteryshow_set_text_items(hWnd, "", "", "");
+    char title[MMI_TESTWND_TEXT_SIZE];
+    mmi_translate(titleKey, title, sizeof(title));
     tp_batteryshow_set_text_items_byIndex(hWnd, title, 1);
     tp_batteryshow_update(hWnd);
+}
+
+void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam) {
+    char pass[MMI_TESTWND_TEXT_SIZE], fail[MMI_TESTWND_TEXT_SIZE];
+    mmi_translate("Result_pass", pass, sizeof(pass));
+    mmi_translate("Result_fail", fail, sizeof(fail));
+    mmi_testwnd_set_bars(hWnd, titleKey, wParam == MMI_TIMER_FOOLPROOF ? pass : "", "", fail);
+}
+
+int mmi_testwnd_params(const char *domain, ftx_config_para *out, int max) {
+    memset(out, 0, sizeof(ftx_config_para) * (size_t)max);
+    const testitem *row = mmi_testitem_main_row(domain);
+    if (row == nullptr) return 0;
+    char parameter[TESTITEM_TEXT_SIZE] = {0};
+    tp_os_strlcpy(parameter, row->parameter, sizeof(parameter));
+    return ftx_config_parse_parameter(parameter, out, max);
+}
+
+int mmi_testwnd_param_int(const ftx_config_para *p, int n, const char *key, const char *def) {
+    char value[FTX_CFG_TEXT_SIZE] = {0};
+    ftx_config_get_para_value(p, n, key, value, sizeof(value), def);
+    return atoi(value);
+}
+
+// ---- windows with their own procedure ----
+
+namespace {
+
+int close_own(void *arg) {
+    HWND hWnd = static_cast<mmi_ownwnd_state *>(arg)->hwnd.load();
+    if (hWnd != HWND_INVALID) SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    return 1;
+}
+
+}  // namespace
+
+int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, int (*open)(void *), void *arg) {
+    Check_AllTestWnd_Closed();
+    st->pcDriven = 0;
+    if (st->hwnd.load() == HWND_INVALID) {
+        mmi_RunOnGuiThread(open, arg);
+        for (int i = 0; !st->created.load(); i++) {
+            if (i == 30) return 1;
+            tp_os_usleep(100000);
+        }
+    }
+    st->pcDriven = 1;
+    HWND hWnd = st->hwnd.load();
+    if (hWnd == HWND_INVALID) return 1;
+    if (!st->activated.load()) {
+        SendMessage(hWnd, MSG_ACTIVE, 1, 0);
+        tp_os_usleep(10000);
+    }
+    if (!st->painted.load()) {
+        SendMessage(hWnd, MSG_PAINT, 0, 0);
+        tp_os_usleep(10000);
+    }
+    return 1;
+}
+
+bool mmi_ownwnd_refuses(mmi_ownwnd_state *st, UINT message, const char *tag) {
+    std::atomic<int> &seen = message == MSG_ACTIVE ? st->activated : st->painted;
+    if (st->pcDriven.load() && !st->created.load()) {
+        seen = 0;
+        TW_DEBUG(tag, "%s::%s g_currentwndCreated=0", __func__,
+                 message == MSG_ACTIVE ? "MSG_ACTIVE" : "MSG_PAINT");
+        return true;
+    }
+    seen = 1;
+    return false;
+}
+
+void mmi_ownwnd_close(mmi_ownwnd_state *st) {
+    mmi_RunOnGuiThread(close_own, st);
 }
 
 void *WaitForFoolProof(void *arg) {
@@ -289,13 +373,7 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
         case MSG_CREATE: {
             d = reinterpret_cast<const mmi_testwnd_desc *>(
                 reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
-            char title[MMI_TESTWND_TEXT_SIZE];
-            mmi_translate(title_of(d), title, sizeof(title));
-            HWND ctrl =
-                CreateWindowEx(CTRL_STATIC, title, WS_VISIBLE | WS_BORDER | SS_CENTER | SS_NOPREFIX,
-                               WS_EX_NONE, MMI_TESTWND_TITLE_ID, 0, 0, w, 0, hWnd, 0);
-            if (g_mmiLogFont[1] && ctrl != HWND_INVALID) SetWindowFont(ctrl, g_mmiLogFont[1]);
-            if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
+            mmi_testwnd_create_title(hWnd, title_of(d));
             d->state->hwnd = hWnd;
             if (d->start.bound()) (*d->start.op)(d->state->mode.load());
             mmi_set_current_test(domain_of(d));

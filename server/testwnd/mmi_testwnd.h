@@ -9,6 +9,7 @@
 #include <atomic>
 #include <mutex>
 
+#include "core/ftx_config.h"
 #include "core/ftx_lib_binding.h"
 #include "mmi_msg.h"
 #include "session/mmi_runstate.h"
@@ -84,6 +85,8 @@ void mmi_testwnd_rect(int w, int h, RECT *out);
 // Creates (not shows) a window in that rectangle, hosted by the main window, on the GUI
 // thread; addData reaches MSG_CREATE. HWND_INVALID on failure (logged).
 HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData);
+// The title control (titleKey translated) and the window fonts, in MSG_CREATE.
+void mmi_testwnd_create_title(HWND hWnd, const char *titleKey);
 // The 3-pixel green line along the window's top edge.
 void mmi_testwnd_draw_top_line(HDC hdc);
 // The text of a language key, or the key itself when the language file lacks it.
@@ -107,6 +110,34 @@ void *WaitForFoolProof(void *arg);
 // The domain of the open test window ("" when none), shared with the PC thread.
 void mmi_set_current_test(const char *domain);
 void mmi_get_current_test(char *out, size_t size);
+
+// A window with its own procedure that the PC can open and drive: its handle and the flags
+// its messages and the PC share.
+struct mmi_ownwnd_state {
+    std::atomic<HWND> hwnd{HWND_INVALID};
+    std::atomic<int> created{0};
+    std::atomic<int> pcDriven{0};
+    std::atomic<int> activated{0};
+    std::atomic<int> painted{0};
+};
+// The PC's open of such a window: every other test window closes, `open` runs on the GUI
+// thread unless the window exists, the created flag is polled (100 ms, at most 30 times; a
+// window that never comes still answers 1), then the window becomes PC-driven and is sent
+// MSG_ACTIVE (1) and MSG_PAINT unless it has seen them.
+int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, int (*open)(void *), void *arg);
+// A PC-driven window that has not been created refuses to activate or paint: true then (the
+// seen flag of `message` is cleared and the refusal logged under tag).
+bool mmi_ownwnd_refuses(mmi_ownwnd_state *st, UINT message, const char *tag);
+// Sends MSG_CLOSE to the window, when there is one, on the GUI thread.
+void mmi_ownwnd_close(mmi_ownwnd_state *st);
+
+// The soft keys (palette text colour) and, unless titleKey is null, the title strip.
+void mmi_testwnd_set_bars(HWND hWnd, const char *titleKey, const char *left, const char *middle,
+                          const char *right);
+// The item's parameter records (at most max) from the main table's row of domain.
+int mmi_testwnd_params(const char *domain, ftx_config_para *out, int max);
+// The integer of an item parameter (its text through atoi; def when it is missing).
+int mmi_testwnd_param_int(const ftx_config_para *p, int n, const char *key, const char *def);
 
 // Open test windows register their stop entry, so that a PC command can close them all.
 void mmi_testwnd_register_open(HWND hWnd, int (*stop)(void));

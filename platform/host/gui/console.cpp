@@ -5,6 +5,7 @@
 #include <limits.h>
 #include <poll.h>
 #include <stdio.h>
+#include <stdlib.h>
 #include <string.h>
 #include <sys/socket.h>
 #include <sys/un.h>
@@ -27,6 +28,8 @@ namespace ftxgui {
 namespace {
 
 const char *kTag = "FTX_CONSOLE";
+// How long one move of a gesture may wait for the application.
+const int kMoveTakenMs = 5000;
 
 std::mutex g_conLock;
 int g_listenFd = -1;
@@ -75,6 +78,43 @@ int do_tap(const ConsoleRequest &r, std::string &, std::string &why) {
     int x = static_cast<int>(r.a), y = static_cast<int>(r.b);
     const int ev[][3] = {{FTX_INPUT_TOUCHDOWN, x, y}, {FTX_INPUT_TOUCHUP, x, y}};
     return inject_all(ev, 2, why);
+}
+
+// The moves of one straight segment: the given steps, or one every kGestureStep pixels.
+int segment_steps(const int *a, const int *b, long steps) {
+    if (steps > 0) return static_cast<int>(steps);
+    const int dx = abs(b[0] - a[0]), dy = abs(b[1] - a[1]);
+    const int longest = dx > dy ? dx : dy;
+    return longest == 0 ? 1 : (longest + kGestureStep - 1) / kGestureStep;
+}
+
+int do_gesture(const ConsoleRequest &r, std::string &, std::string &why) {
+    for (int i = 0; i < r.pointCount; i++) {
+        if (r.points[i][0] >= g_fbW || r.points[i][1] >= g_fbH) {
+            why = "outside the screen";
+            return -1;
+        }
+    }
+    const int(*pt)[2] = r.points;
+    const int first[][3] = {{FTX_INPUT_TOUCHDOWN, pt[0][0], pt[0][1]}};
+    if (inject_all(first, 1, why) != 0) return -1;
+    for (int i = 1; i < r.pointCount; i++) {
+        const int n = segment_steps(pt[i - 1], pt[i], r.steps);
+        for (int k = 1; k <= n; k++) {
+            const int x = pt[i - 1][0] + (pt[i][0] - pt[i - 1][0]) * k / n;
+            const int y = pt[i - 1][1] + (pt[i][1] - pt[i - 1][1]) * k / n;
+            const int move[][3] = {{FTX_INPUT_TOUCHMOVE, x, y}};
+            if (inject_all(move, 1, why) != 0) return -1;
+            // As a panel reports: the application sees every point of the way.
+            if (!wait_moves_taken(kMoveTakenMs)) {
+                why = "the application does not take the touch moves";
+                return -1;
+            }
+        }
+    }
+    const int *last = pt[r.pointCount - 1];
+    const int up[][3] = {{FTX_INPUT_TOUCHUP, last[0], last[1]}};
+    return inject_all(up, 1, why);
 }
 
 int do_screenshot(const ConsoleRequest &r, std::string &out, std::string &why) {
@@ -142,8 +182,9 @@ int do_idle(const ConsoleRequest &r, std::string &, std::string &why) {
 }
 
 // Indexed by ConsoleCmd.
-const ConsoleHandler kHandlers[] = {do_key,    do_touch, do_tap, do_screenshot, do_windows,
-                                    do_screen, do_help,  do_hw,  do_idle};
+const ConsoleHandler kHandlers[] = {do_key,     do_touch,   do_tap,    do_screenshot,
+                                    do_windows, do_screen,  do_help,   do_hw,
+                                    do_idle,    do_gesture, do_gesture};
 
 void serve_client(int fd) {
     std::string pending;

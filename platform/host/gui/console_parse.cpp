@@ -76,8 +76,10 @@ struct KeyName {
     long code;
 };
 const KeyName kKeyNames[] = {
-    {"power", 1},  {"enter", 28}, {"up", 103},  {"down", 108}, {"home", 102}, {"back", 88},
-    {"menu", 127}, {"left", 60},  {"pass", 60}, {"right", 61}, {"fail", 61},  {"middle", 62},
+    {"power", 1},         {"enter", 28}, {"up", 103},     {"down", 108},  {"volume-up", 103},
+    {"volume-down", 108}, {"home", 102}, {"back", 88},    {"menu", 127},  {"camera", 68},
+    {"search", 128},      {"hook", 130}, {"recent", 187}, {"torch", 131}, {"tv", 377},
+    {"left", 60},         {"pass", 60},  {"right", 61},   {"fail", 61},   {"middle", 62},
 };
 
 bool key_code(const Words &w, int i, long *out) {
@@ -135,6 +137,59 @@ int parse_tap(const Words &w, ConsoleRequest *req, char *why, size_t size) {
     return parse_point(w, 1, req, why, size);
 }
 
+int parse_swipe(const Words &w, ConsoleRequest *req, char *why, size_t size) {
+    if (w.count != 5 && w.count != 6)
+        return fail(why, size, "usage: swipe X1 Y1 X2 Y2 [STEPS]"), -1;
+    long c[4];
+    for (int i = 0; i < 4; i++)
+        if (!number(w, 1 + i, 0, kMaxCoord, &c[i])) return fail(why, size, "bad coordinates"), -1;
+    if (w.count == 6 && !number(w, 5, 1, kGestureStepsMax, &req->steps))
+        return fail(why, size, "bad step count"), -1;
+    req->points[0][0] = (int)c[0];
+    req->points[0][1] = (int)c[1];
+    req->points[1][0] = (int)c[2];
+    req->points[1][1] = (int)c[3];
+    req->pointCount = 2;
+    return 0;
+}
+
+// "X,Y": one point of a path.
+bool point(const char *s, size_t n, int *x, int *y) {
+    const char *comma = static_cast<const char *>(memchr(s, ',', n));
+    if (comma == nullptr) return false;
+    Words one;
+    one.count = 2;
+    one.p[0] = s;
+    one.n[0] = static_cast<size_t>(comma - s);
+    one.p[1] = comma + 1;
+    one.n[1] = n - one.n[0] - 1;
+    long a, b;
+    if (!number(one, 0, 0, kMaxCoord, &a) || !number(one, 1, 0, kMaxCoord, &b)) return false;
+    *x = (int)a;
+    *y = (int)b;
+    return true;
+}
+
+int parse_path(const Words &w, ConsoleRequest *req, char *why, size_t size) {
+    const char *usage = "usage: path X,Y X,Y [X,Y ...]";
+    if (w.count < 3 || w.rest == nullptr) return fail(why, size, usage), -1;
+    const char *p = w.rest;
+    while (p < w.end) {
+        while (p < w.end && blank(*p))
+            p++;
+        if (p >= w.end) break;
+        const char *start = p;
+        while (p < w.end && !blank(*p))
+            p++;
+        if (req->pointCount == kGesturePointsMax) return fail(why, size, "too many points"), -1;
+        int *pt = req->points[req->pointCount];
+        if (!point(start, static_cast<size_t>(p - start), &pt[0], &pt[1]))
+            return fail(why, size, "bad point (X,Y)"), -1;
+        req->pointCount++;
+    }
+    return 0;
+}
+
 int parse_screenshot(const Words &w, ConsoleRequest *req, char *why, size_t size) {
     const bool aux = w.count == 3 && word_is(w, 1, "--aux");
     // A file name never starts with '-': "screenshot --aux" is a request without its file.
@@ -178,11 +233,17 @@ struct Command {
 
 const Command kCommands[] = {
     {"key", CON_KEY, parse_key,
-     "key down|up|press CODE   a handset key (number or power, up, down, enter, home, back, menu, "
-     "left, right, middle)"},
+     "key down|up|press CODE   a handset key (number or power, volume-up (up), volume-down "
+     "(down), home, back, menu, camera, search, hook, recent, torch, tv, enter, pass (left), "
+     "fail (right), middle)"},
     {"touch", CON_TOUCH, parse_touch,
      "touch down|move|up X Y   the finger on the panel (screen pixels)"},
     {"tap", CON_TAP, parse_tap, "tap X Y                  touch down and up at one point"},
+    {"swipe", CON_SWIPE, parse_swipe,
+     "swipe X1 Y1 X2 Y2 [STEPS]  the finger down, moved in STEPS moves, and up"},
+    {"path", CON_PATH, parse_path,
+     "path X,Y X,Y ...         the finger down at the first point, along the straight lines "
+     "through the others, up at the last"},
     {"screenshot", CON_SCREENSHOT, parse_screenshot,
      "screenshot [--aux] FILE.png  the picture as shown (host path); --aux: the auxiliary "
      "display"},
@@ -210,8 +271,9 @@ int console_parse(const char *line, size_t len, ConsoleRequest *req, char *why, 
     for (const Command &c : kCommands) {
         if (!word_is(w, 0, c.name)) continue;
         req->cmd = c.cmd;
-        // A hw line may have any number of words; it is passed on whole.
-        if (w.overflow && c.cmd != CON_HW) return fail(why, whySize, "too many words"), -1;
+        // A hw line and a path may have any number of words.
+        if (w.overflow && c.cmd != CON_HW && c.cmd != CON_PATH)
+            return fail(why, whySize, "too many words"), -1;
         return c.parse(w, req, why, whySize);
     }
     return fail(why, whySize, "unknown command (try help)"), -1;

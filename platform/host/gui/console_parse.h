@@ -15,11 +15,18 @@ enum ConsoleCmd {
     CON_HELP,
     CON_HW,
     CON_IDLE,
+    CON_SWIPE,
+    CON_PATH,
 };
 
 enum ConsoleAction { ACT_NONE, ACT_DOWN, ACT_UP, ACT_PRESS, ACT_MOVE };
 
 constexpr size_t kConsoleLineMax = 4096;
+// Points of one gesture (a swipe is two), and the longest step between two touch moves of a
+// path when the steps are not given.
+constexpr int kGesturePointsMax = 512;
+constexpr int kGestureStep = 8;
+constexpr long kGestureStepsMax = 10000;
 
 struct ConsoleRequest {
     ConsoleCmd cmd;
@@ -27,6 +34,11 @@ struct ConsoleRequest {
     long a;
     long b;
     char text[kConsoleLineMax];  // screenshot path, or the hw line
+    // A gesture: its points, and the touch moves from one point to the next (0: one every
+    // kGestureStep pixels at most).
+    int points[kGesturePointsMax][2];
+    int pointCount;
+    long steps;
 };
 
 // Parses one request line (without its line end). Returns 0, or -1 with a reason for the

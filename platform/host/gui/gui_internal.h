@@ -128,6 +128,13 @@ void wake_locked(MsgQueue *q);
 std::vector<Window *> zorder_snapshot_locked();
 Window *active_locked();
 bool queues_idle_locked();
+// A touch move is waiting in some queue (a newer one would replace it).
+bool moves_pending_locked();
+// Waits until the input layer has handed on every event and no window has a touch move
+// waiting: a gesture's next move then cannot replace one not yet seen. False on time-out.
+bool wait_moves_taken(int timeoutMs);
+// The desktop's answer to a request sent to HWND_DESKTOP.
+LRESULT desktop_request_locked(UINT msg, WPARAM wp, LPARAM lp);
 
 // Runs fn on the thread that owns w (directly when that is this thread).
 LRESULT call_on_owner(Window *w, LRESULT (*fn)(Window *, void *), void *arg);

@@ -31,6 +31,11 @@ void *g_keyCtx = nullptr;
 MSGHOOK g_mouseHook = nullptr;
 void *g_mouseCtx = nullptr;
 Window *g_touchWnd = nullptr;  // the window that got the finger down
+// The window a touch-tracking request named: it gets every touch until the next request.
+HWND g_trackWnd = HWND_NULL;
+// The desktop's touch-tracking request: wParam the window to track the finger (0: none);
+// the answer is the window that tracked it before (0: none), to be given back later.
+constexpr UINT kMsgTrackTouch = 0xF8;
 
 Window *window_at_locked(int x, int y) {
     for (Window *w : zorder_snapshot_locked()) {
@@ -94,7 +99,10 @@ void handle_touch(const InputEvent &e) {
             hook = g_mouseHook;
             ctx = g_mouseCtx;
             if (msg == MSG_LBUTTONDOWN) g_touchWnd = w;
-            target = g_touchWnd != nullptr && alive_locked(g_touchWnd) ? g_touchWnd : w;
+            if (g_trackWnd != HWND_NULL && alive_locked(g_trackWnd))
+                target = as_window_locked(g_trackWnd);
+            else
+                target = g_touchWnd != nullptr && alive_locked(g_touchWnd) ? g_touchWnd : w;
         }
         if (msg == MSG_LBUTTONUP) g_touchWnd = nullptr;
         if (target != nullptr) {
@@ -152,6 +160,27 @@ const KeyCode kKeyCodes[] = {
 };
 
 }  // namespace
+
+LRESULT desktop_request_locked(UINT msg, WPARAM wp, LPARAM) {
+    if (msg != kMsgTrackTouch) return 0;
+    HWND before = g_trackWnd != HWND_NULL && alive_locked(g_trackWnd) ? g_trackWnd : HWND_NULL;
+    g_trackWnd = reinterpret_cast<HWND>(wp);
+    return reinterpret_cast<LRESULT>(before);
+}
+
+bool wait_moves_taken(int timeoutMs) {
+    auto until = std::chrono::steady_clock::now() + std::chrono::milliseconds(timeoutMs);
+    while (std::chrono::steady_clock::now() < until) {
+        bool taken = input_idle();
+        if (taken) {
+            std::lock_guard<std::mutex> lk(g_lock);
+            taken = !moves_pending_locked();
+        }
+        if (taken) return true;
+        std::this_thread::sleep_for(std::chrono::microseconds(200));
+    }
+    return false;
+}
 
 bool ial_running() {
     return g_running.load();

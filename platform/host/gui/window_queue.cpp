@@ -175,6 +175,13 @@ bool queues_idle_locked() {
     return true;
 }
 
+bool moves_pending_locked() {
+    for (MsgQueue *q : g_queues)
+        for (const MSG &m : q->posted)
+            if (m.message == MSG_MOUSEMOVE) return true;
+    return false;
+}
+
 LRESULT call_on_owner(Window *w, LRESULT (*fn)(Window *, void *), void *arg) {
     std::unique_lock<std::mutex> lk(g_lock);
     if (g_windows.count(w) == 0) return 0;
@@ -267,8 +274,8 @@ LRESULT DispatchMessage(PMSG pMsg) {
 }
 
 LRESULT SendMessage(HWND h, UINT msg, WPARAM wp, LPARAM lp) {
-    if (h == HWND_DESKTOP) return 0;  // the desktop answers its requests with 0
     std::unique_lock<std::mutex> lk(g_lock);
+    if (h == HWND_DESKTOP) return desktop_request_locked(msg, wp, lp);
     Window *w = as_window_locked(h);
     if (w == nullptr) return -1;
     MsgQueue *q = w->queue;

@@ -338,19 +338,11 @@ long mmi_lcd_pack_gray(int r, int g, int b) {
 
 int mmi_LCDColorTest_Init(void) {
     char colornum[FTX_CFG_TEXT_SIZE] = {0};
-    int itemMmi = 0;
+    ftx_config_para paras[kMaxParams];
+    const int n = mmi_testwnd_params(catalogue::Lcd.domain, paras, kMaxParams);
+    ftx_config_get_para_value(paras, n, "colornum", colornum, sizeof(colornum), "5");
     const testitem *row = mmi_testitem_main_row(catalogue::Lcd.domain);
-    if (row != nullptr) {
-        ftx_config_para paras[kMaxParams];
-        memset(paras, 0, sizeof(paras));
-        char parameter[TESTITEM_TEXT_SIZE] = {0};
-        tp_os_strlcpy(parameter, row->parameter, sizeof(parameter));
-        const int n = ftx_config_parse_parameter(parameter, paras, kMaxParams);
-        ftx_config_get_para_value(paras, n, "colornum", colornum, sizeof(colornum), "5");
-        itemMmi = row->item_mmi;
-    } else {
-        tp_os_strlcpy(colornum, "5", sizeof(colornum));
-    }
+    const int itemMmi = row != nullptr ? row->item_mmi : 0;
     LCD_DEBUG(s_lcd.tag, "%s::LcdColorTestNum=%d", __func__, atoi(colornum));
     int size = 0;
     s_lcd.count = mmi_lcd_colour_table(colornum, itemMmi, s_lcd.table, &size);

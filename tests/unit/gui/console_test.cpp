@@ -161,6 +161,58 @@ TEST(Console, KeysAndTapsGoThroughTheHooksToTheActiveWindow) {
     EXPECT_EQ(log().of(gui.hwnd(), MSG_LBUTTONUP)[0].lp, MAKELONG(30, 40));
 }
 
+TEST(Console, GesturesDeliverEveryPointOfTheWayInOrder) {
+    log().clear();
+    GuiThread gui;
+    ASSERT_TRUE(idle());
+    Console con;
+    EXPECT_EQ(con.ask("swipe 10 10 50 10 4"), "OK\n");
+    // Without steps a path moves at most 8 pixels at a time.
+    EXPECT_EQ(con.ask("path 0,0 0,16   8,16"), "OK\n");
+    EXPECT_EQ(con.ask("idle"), "OK\n");
+    std::vector<LPARAM> got;
+    for (const Rec &m : log().all())
+        if (m.hwnd != gui.hwnd())
+            continue;
+        else if (m.msg == MSG_LBUTTONDOWN || m.msg == MSG_MOUSEMOVE || m.msg == MSG_LBUTTONUP)
+            got.push_back(m.msg == MSG_MOUSEMOVE ? m.lp : -m.lp - 1);
+    auto at = [](int x, int y) { return static_cast<LPARAM>(MAKELONG(x, y)); };
+    auto edge = [](int x, int y) { return -static_cast<LPARAM>(MAKELONG(x, y)) - 1; };
+    const std::vector<LPARAM> want = {edge(10, 10), at(20, 10),   at(30, 10), at(40, 10),
+                                      at(50, 10),   edge(50, 10), edge(0, 0), at(0, 8),
+                                      at(0, 16),    at(8, 16),    edge(8, 16)};
+    EXPECT_EQ(got, want);
+    EXPECT_EQ(con.ask("path 1,1"), "KO usage: path X,Y X,Y [X,Y ...]\n");
+    EXPECT_EQ(con.ask("path 1,1 2"), "KO bad point (X,Y)\n");
+    EXPECT_EQ(con.ask("path 1,1 2,-2"), "KO bad point (X,Y)\n");
+    EXPECT_EQ(con.ask("swipe 1 2 3"), "KO usage: swipe X1 Y1 X2 Y2 [STEPS]\n");
+    EXPECT_EQ(con.ask("swipe 1 2 3 4 0"), "KO bad step count\n");
+    EXPECT_EQ(con.ask("swipe 1 1 9999 1"), "KO outside the screen\n");
+    std::string many = "path";
+    for (int i = 0; i <= 512; i++)
+        many += " 1,1";
+    EXPECT_EQ(con.ask(many), "KO too many points\n");
+}
+
+TEST(Console, ATrackingWindowGetsTheTouchesUntilItIsGivenBack) {
+    GuiThread below(RECT{0, 0, kW, kH}, "below");
+    GuiThread above(RECT{0, 100, kW, 700}, "above");
+    ASSERT_TRUE(idle());
+    log().clear();
+    const UINT track = 248;
+    EXPECT_EQ(0, SendMessage(HWND_DESKTOP, track, reinterpret_cast<WPARAM>(above.hwnd()), 0));
+    Console con;
+    EXPECT_EQ(con.ask("tap 10 50"), "OK\n");  // over the lower window only
+    EXPECT_EQ(con.ask("idle"), "OK\n");
+    EXPECT_EQ(1u, log().of(above.hwnd(), MSG_LBUTTONDOWN).size());
+    EXPECT_EQ(0u, log().of(below.hwnd(), MSG_LBUTTONDOWN).size());
+    // The answer is the window that tracked before: handing it back ends the tracking.
+    EXPECT_EQ(reinterpret_cast<LRESULT>(above.hwnd()), SendMessage(HWND_DESKTOP, track, 0, 0));
+    EXPECT_EQ(con.ask("tap 10 50"), "OK\n");
+    EXPECT_EQ(con.ask("idle"), "OK\n");
+    EXPECT_EQ(1u, log().of(below.hwnd(), MSG_LBUTTONDOWN).size());
+}
+
 TEST(Console, WindowsListsTheStackTopFirst) {
     GuiThread below(RECT{0, 0, kW, kH}, "below");
     GuiThread above(RECT{0, 100, kW, 700}, "above");
@@ -184,6 +236,7 @@ TEST(Console, RequestsAreCheckedBeforeAnythingHappens) {
     EXPECT_EQ(con.ask("frobnicate"), "KO unknown command (try help)\n");
     EXPECT_EQ(con.ask("key press"), "KO usage: key down|up|press CODE\n");
     EXPECT_EQ(con.ask("key press banana"), "KO bad key code\n");
+    EXPECT_EQ(con.ask("key press volume-up"), "OK\n");
     EXPECT_EQ(con.ask("tap 10"), "KO usage: tap X Y\n");
     EXPECT_EQ(con.ask("tap -1 10"), "KO bad coordinates\n");
     EXPECT_EQ(con.ask("tap 10 5000"), "KO outside the screen\n");
@@ -192,8 +245,8 @@ TEST(Console, RequestsAreCheckedBeforeAnythingHappens) {
     EXPECT_EQ(con.ask(""), "KO empty line\n");
     EXPECT_EQ(con.ask("screen\r").substr(0, 12), "size 480x800");
     std::string help = con.ask("help");
-    for (const char *cmd :
-         {"key ", "touch ", "tap ", "screenshot ", "windows", "screen", "hw ", "help"})
+    for (const char *cmd : {"key ", "touch ", "tap ", "swipe ", "path ", "screenshot ", "windows",
+                            "screen", "hw ", "help", "camera", "volume-down"})
         EXPECT_NE(help.find(cmd), std::string::npos) << cmd;
     EXPECT_EQ(con.ask(std::string(5000, 'x')), "KO line too long\n");
     EXPECT_EQ(con.ask("screen").substr(0, 4), "size") << "the connection survives a bad line";
