@@ -172,6 +172,27 @@ HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
     return hWnd;
 }
 
+HWND mmi_testwnd_create_full(const char *caption, WNDPROC proc, DWORD addData) {
+    MAINWINCREATE create;
+    memset(&create, 0, sizeof(create));
+    create.dwStyle = WS_VISIBLE;
+    create.dwExStyle = WS_EX_TOPMOST;
+    create.spCaption = caption;
+    create.hHosting = mmi_guithread_window();
+    create.MainWindowProc = proc;
+    create.rx = g_ptScreenInfo.width;
+    create.by = g_ptScreenInfo.height;
+    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
+    create.dwAddData = addData;
+    HWND hWnd = CreateMainWindow(&create);
+    if (hWnd == HWND_INVALID) {
+        TW_ERROR("FTX_MAIN", "%s CreateMainWindow %s fail", __func__, caption);
+        return hWnd;
+    }
+    ShowWindow(hWnd, SW_SHOWNORMAL);
+    return hWnd;
+}
+
 void mmi_testwnd_create_title(HWND hWnd, const char *titleKey) {
     char title[MMI_TESTWND_TEXT_SIZE];
     mmi_translate(titleKey, title, sizeof(title));
@@ -242,13 +263,34 @@ int close_own(void *arg) {
     return 1;
 }
 
+int open_own(void *arg) {
+    reinterpret_cast<void *(*)(void)>(arg)();
+    return 1;
+}
+
+struct OwnStop {
+    mmi_ownwnd_state *st;
+    int (*verdict)(char *, unsigned int);
+    char *reply;
+    unsigned int size;
+};
+
+int stop_own(void *arg) {
+    OwnStop *o = static_cast<OwnStop *>(arg);
+    HWND hWnd = o->st->hwnd.load();
+    if (hWnd == HWND_INVALID) return -1;
+    const int verdict = o->verdict(o->reply, o->size);
+    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    return verdict;
+}
+
 }  // namespace
 
-int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, int (*open)(void *), void *arg) {
+int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void *(*open)(void)) {
     Check_AllTestWnd_Closed();
     st->pcDriven = 0;
     if (st->hwnd.load() == HWND_INVALID) {
-        mmi_RunOnGuiThread(open, arg);
+        mmi_RunOnGuiThread(open_own, reinterpret_cast<void *>(open));
         for (int i = 0; !st->created.load(); i++) {
             if (i == 30) return 1;
             tp_os_usleep(100000);
@@ -266,6 +308,26 @@ int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, int (*open)(void *), void *arg) {
         tp_os_usleep(10000);
     }
     return 1;
+}
+
+int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st, int (*verdict)(char *reply, unsigned int size),
+                       char *reply, unsigned int size) {
+    OwnStop o{st, verdict, reply, size};
+    const int answer = mmi_RunOnGuiThread(stop_own, &o);
+    if (answer >= 0) tp_os_usleep(100000);
+    return answer;
+}
+
+void mmi_ownwnd_destroy(mmi_ownwnd_state *st, HWND hWnd) {
+    mmi_set_current_test("");
+    st->created = 0;
+    st->pcDriven = 0;
+    st->activated = 0;
+    st->painted = 0;
+    mmi_testwnd_unregister(hWnd);
+    st->hwnd = HWND_INVALID;
+    DestroyAllControls(hWnd);
+    DestroyMainWindow(hWnd);
 }
 
 bool mmi_ownwnd_refuses(mmi_ownwnd_state *st, UINT message, const char *tag) {

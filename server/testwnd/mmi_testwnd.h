@@ -85,6 +85,8 @@ void mmi_testwnd_rect(int w, int h, RECT *out);
 // Creates (not shows) a window in that rectangle, hosted by the main window, on the GUI
 // thread; addData reaches MSG_CREATE. HWND_INVALID on failure (logged).
 HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData);
+// The same over the whole screen, title strip and soft-key bar included (topmost), shown.
+HWND mmi_testwnd_create_full(const char *caption, WNDPROC proc, DWORD addData);
 // The title control (titleKey translated) and the window fonts, in MSG_CREATE.
 void mmi_testwnd_create_title(HWND hWnd, const char *titleKey);
 // The 3-pixel green line along the window's top edge.
@@ -124,7 +126,14 @@ struct mmi_ownwnd_state {
 // thread unless the window exists, the created flag is polled (100 ms, at most 30 times; a
 // window that never comes still answers 1), then the window becomes PC-driven and is sent
 // MSG_ACTIVE (1) and MSG_PAINT unless it has seen them.
-int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, int (*open)(void *), void *arg);
+int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void *(*open)(void));
+// The PC's close: on the GUI thread, verdict(reply, size) judges the open window, which is
+// then closed; its answer after 100 ms, or -1 when no window was open.
+int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st, int (*verdict)(char *reply, unsigned int size),
+                       char *reply, unsigned int size);
+// MSG_CLOSE's common end: no current test, the flags cleared, the window unregistered and
+// destroyed with its controls.
+void mmi_ownwnd_destroy(mmi_ownwnd_state *st, HWND hWnd);
 // A PC-driven window that has not been created refuses to activate or paint: true then (the
 // seen flag of `message` is cleared and the refusal logged under tag).
 bool mmi_ownwnd_refuses(mmi_ownwnd_state *st, UINT message, const char *tag);

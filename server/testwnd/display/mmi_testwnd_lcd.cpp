@@ -204,28 +204,11 @@ LRESULT colour_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
 // The full-screen window of a colour screen, shown; HWND_INVALID on failure.
 HWND create_colour_window(ColourScreen *s) {
     LCD_DEBUG(s->tag, "%s begin", __func__);
-    MAINWINCREATE create;
-    memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_VISIBLE;
     // Over the title strip too: the colour fills the whole panel.
-    create.dwExStyle = WS_EX_TOPMOST;
-    create.spCaption = "";
-    create.hHosting = mmi_guithread_window();
-    create.MainWindowProc = colour_proc;
-    create.lx = 0;
-    create.ty = 0;
-    create.rx = g_ptScreenInfo.width;
-    create.by = g_ptScreenInfo.height;
-    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
-    create.dwAddData = reinterpret_cast<DWORD>(s);
-    HWND hWnd = CreateMainWindow(&create);
-    if (hWnd == HWND_INVALID) {
-        LCD_ERROR(s->tag, "%s CreateMainWindow fail", __func__);
-        return hWnd;
-    }
+    HWND hWnd = mmi_testwnd_create_full("", colour_proc, reinterpret_cast<DWORD>(s));
+    if (hWnd == HWND_INVALID) return hWnd;
     s->hwnd = hWnd;
     mmi_testwnd_register_open(hWnd, s->stopEntry);
-    ShowWindow(hWnd, SW_SHOWNORMAL);
     LCD_DEBUG(s->tag, "%s end", __func__);
     return hWnd;
 }

@@ -128,6 +128,8 @@ LRESULT hook_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
                 k.done = 0;
             s_hookPressed = 0;
             mmi_set_current_test(kTag);
+            // The library may call back as soon as it starts: the window is known by then.
+            s_wnd.hwnd = hWnd;
             s_wnd.created = 1;
             if (hw::ftx_api_HookKeyTest_Start) hw::ftx_api_HookKeyTest_Start(hookkey_test_callback);
             break;
@@ -153,14 +155,7 @@ LRESULT hook_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             fail_and_close(hWnd);
             return 0;
         case MSG_CLOSE:
-            mmi_set_current_test("");
-            s_wnd.created = 0;
-            s_wnd.pcDriven = 0;
-            s_wnd.activated = 0;
-            s_wnd.painted = 0;
-            mmi_testwnd_unregister(hWnd);
-            s_wnd.hwnd = HWND_INVALID;
-            DestroyMainWindow(hWnd);
+            mmi_ownwnd_destroy(&s_wnd, hWnd);
             return 0;
         default:
             break;
@@ -168,26 +163,11 @@ LRESULT hook_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     return DefaultMainWinProc(hWnd, message, wParam, lParam);
 }
 
-int open_on_gui(void *) {
-    mmi_teswnd_HookKeyTest();
-    return 1;
-}
-
-struct StopReply {
-    char *reply;
-    unsigned int size;
-    int verdict;
-};
-
-int stop_on_gui(void *arg) {
-    StopReply *r = static_cast<StopReply *>(arg);
-    HWND hWnd = s_wnd.hwnd.load();
-    if (hWnd == HWND_INVALID) return 0;
+// The PC's verdict, on the GUI thread: the library's stop text, and whether the key passed.
+int hook_verdict(char *reply, unsigned int size) {
     s_wnd.pcDriven = 0;
-    lib_stop(r->reply, r->size);
-    r->verdict = hook_done() ? 1 : 0;
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
-    return 1;
+    lib_stop(reply, size);
+    return hook_done() ? 1 : 0;
 }
 
 }  // namespace
@@ -212,7 +192,6 @@ void *mmi_teswnd_HookKeyTest(void) {
     load_lib_interface_hookkey(kTag);
     HWND hWnd = mmi_testwnd_create("Hook Key Test", hook_proc, 0);
     if (hWnd == HWND_INVALID) return hWnd;
-    s_wnd.hwnd = hWnd;
     mmi_testwnd_register_open(hWnd, mmi_teswnd_HookKeyTest_Stop_Entry);
     ShowWindow(hWnd, SW_SHOWNORMAL);
     return hWnd;
@@ -230,9 +209,10 @@ int mmi_teswnd_HookKeyTest_Stop_Entry(void) {
 }
 
 void hookkey_test_callback(unsigned int *status) {
-    HOOK_DEBUG("hook key callback begin");
     const unsigned int s = status != nullptr ? *status : 0;
     HWND hWnd = s_wnd.hwnd.load();
+    HOOK_DEBUG("hook key callback begin: status=%u window=%s", s,
+               hWnd == HWND_INVALID ? "none" : "open");
     if (s != 1 || hWnd == HWND_INVALID) return;
     SendMessage(hWnd, MSG_CALLBACK, 1, 0);
     s_hookPressed = 1;
@@ -240,15 +220,14 @@ void hookkey_test_callback(unsigned int *status) {
 
 int mmi_AutoTest_HeadsetHookTestEntry(void) {
     HOOK_DEBUG("%s::L%d,g_currentwndCreated=%d", __func__, 463, s_wnd.created.load());
-    return mmi_ownwnd_pc_open(&s_wnd, open_on_gui, nullptr);
+    return mmi_ownwnd_pc_open(&s_wnd, mmi_teswnd_HookKeyTest);
 }
 
 int mmi_AutoTest_HeadsetHookTest_Stop_Entry(char *reply, unsigned int size) {
-    StopReply r{reply, size, 0};
-    if (s_wnd.hwnd.load() == HWND_INVALID || !mmi_RunOnGuiThread(stop_on_gui, &r)) {
+    const int verdict = mmi_ownwnd_pc_stop(&s_wnd, hook_verdict, reply, size);
+    if (verdict < 0) {
         HOOK_ERROR("%s::currentwnd is not created", __func__);
         return 0;
     }
-    tp_os_usleep(100000);
-    return r.verdict;
+    return verdict;
 }

@@ -45,6 +45,11 @@ std::atomic<int> s_allDone{0};
 // The converted codes of the keys released, each followed by ',' (GUI thread).
 char g_keys_buf[256];
 
+int open_on_gui(void *) {
+    mmi_teswnd_KeyTest();
+    return 1;
+}
+
 void close_key_window(HWND hWnd) {
     SendMessage(hWnd, MSG_CLOSE, 0, 0);
 }
@@ -128,16 +133,8 @@ LRESULT key_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             return 0;
         case MSG_CLOSE:
             if (!s_wnd.pcDriven.load()) Set_OsCanIdleAllowed(1);
-            mmi_set_current_test("");
-            s_wnd.created = 0;
-            s_wnd.pcDriven = 0;
-            s_wnd.activated = 0;
-            s_wnd.painted = 0;
             memset(g_keys_buf, 0, sizeof(g_keys_buf));
-            mmi_testwnd_unregister(hWnd);
-            s_wnd.hwnd = HWND_INVALID;
-            DestroyAllControls(hWnd);
-            DestroyMainWindow(hWnd);
+            mmi_ownwnd_destroy(&s_wnd, hWnd);
             return 0;
         default:
             break;
@@ -145,38 +142,21 @@ LRESULT key_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     return DefaultMainWinProc(hWnd, message, wParam, lParam);
 }
 
-int open_on_gui(void *) {
-    mmi_teswnd_KeyTest();
-    return 1;
-}
-
-struct StopReply {
-    char *reply;
-    unsigned int size;
-    int verdict;
-};
-
-// The PC's verdict, on the GUI thread where the table lives; closes the window.
-int stop_on_gui(void *arg) {
-    StopReply *r = static_cast<StopReply *>(arg);
-    HWND hWnd = s_wnd.hwnd.load();
-    if (hWnd == HWND_INVALID) return 0;
+// The PC's verdict, on the GUI thread where the table lives.
+int key_verdict(char *reply, unsigned int size) {
     const size_t n = strlen(g_keys_buf);
     if (n > 0 && g_keys_buf[n - 1] == ',') g_keys_buf[n - 1] = '\0';
     char pending[MMI_KEY_TEXT_SIZE];
     mmi_key_pending_codes(Keytest_Item, pending, sizeof(pending));
     if (pending[0] == '\0') {
         KEY_DEBUG("%s::success keys=%s", "mmi_AutoTest_KeyTest_Stop_Entry", g_keys_buf);
-        tp_os_strlcpy(r->reply, g_keys_buf, r->size);
-        r->verdict = 1;
-    } else {
-        pending[strlen(pending) - 1] = '\0';
-        KEY_ERROR("%s::fail keys=%s", "mmi_AutoTest_KeyTest_Stop_Entry", pending);
-        tp_os_strlcpy(r->reply, pending, r->size);
-        r->verdict = 0;
+        tp_os_strlcpy(reply, g_keys_buf, size);
+        return 1;
     }
-    close_key_window(hWnd);
-    return 1;
+    pending[strlen(pending) - 1] = '\0';
+    KEY_ERROR("%s::fail keys=%s", "mmi_AutoTest_KeyTest_Stop_Entry", pending);
+    tp_os_strlcpy(reply, pending, size);
+    return 0;
 }
 
 }  // namespace
@@ -303,18 +283,17 @@ void mmiTestMsgKeyTestProc(HWND hWnd, WPARAM key, UINT message) {
 // ---- PC and PCBA ----
 
 int mmi_AutoTest_KeyTestEntry(void) {
-    return mmi_ownwnd_pc_open(&s_wnd, open_on_gui, nullptr);
+    return mmi_ownwnd_pc_open(&s_wnd, mmi_teswnd_KeyTest);
 }
 
 int mmi_AutoTest_KeyTest_Stop_Entry(char *reply, unsigned int size) {
-    StopReply r{reply, size, 0};
-    if (s_wnd.hwnd.load() == HWND_INVALID || !mmi_RunOnGuiThread(stop_on_gui, &r)) {
+    const int verdict = mmi_ownwnd_pc_stop(&s_wnd, key_verdict, reply, size);
+    if (verdict < 0) {
         KEY_ERROR("%s::currentwnd is not created", __func__);
         tp_os_strlcpy(reply, "nothing opened", size);
         return 0;
     }
-    tp_os_usleep(100000);
-    return r.verdict;
+    return verdict;
 }
 
 int PCBAKeyTestStart(void) {

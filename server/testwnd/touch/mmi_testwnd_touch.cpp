@@ -293,17 +293,10 @@ LRESULT touch_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             s_preview = 0;
             if (g_StopTouchTestKeyVal.load() == 1 && !s_wnd.pcDriven.load())
                 Set_OsCanIdleAllowed(1);
-            mmi_set_current_test("");
-            s_wnd.pcDriven = 0;
-            s_wnd.created = 0;
-            s_wnd.activated = 0;
-            s_wnd.painted = 0;
             s_trailOn = false;
             mmi_cells_free(&cells);
-            mmi_testwnd_unregister(hWnd);
-            s_wnd.hwnd = HWND_INVALID;
             tp_skb_show(1);
-            DestroyMainWindow(hWnd);
+            mmi_ownwnd_destroy(&s_wnd, hWnd);
             return 0;
         default:
             break;
@@ -321,24 +314,10 @@ LRESULT mmi_TouchAdjusting_CircleGridProc(HWND hWnd, UINT message, WPARAM wParam
 
 // The full-screen window, shown; HWND_INVALID on failure.
 HWND create_window(WNDPROC proc) {
-    MAINWINCREATE create;
-    memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_VISIBLE;
-    create.dwExStyle = WS_EX_TOPMOST;
-    create.spCaption = "Touch Test";
-    create.hHosting = mmi_guithread_window();
-    create.MainWindowProc = proc;
-    create.rx = g_ptScreenInfo.width;
-    create.by = g_ptScreenInfo.height;
-    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
-    HWND hWnd = CreateMainWindow(&create);
-    if (hWnd == HWND_INVALID) {
-        TOUCH_ERROR("%s CreateMainWindow fail", __func__);
-        return hWnd;
-    }
+    HWND hWnd = mmi_testwnd_create_full("Touch Test", proc, 0);
+    if (hWnd == HWND_INVALID) return hWnd;
     s_wnd.hwnd = hWnd;
     mmi_testwnd_register_open(hWnd, mmi_AutoTest_touchscreenTest_Stop_Entry);
-    ShowWindow(hWnd, SW_SHOWNORMAL);
     return hWnd;
 }
 
@@ -352,42 +331,29 @@ HWND open_edge_test(void) {
     return create_window(mmi_TouchAdjusting_LineWinProc);
 }
 
-// The window the screen's shape asks for, on the GUI thread.
-int open_on_gui(void *) {
-    if (g_bTPShape == 1)
-        mmi_testwnd_touch_circlegrid_Entry();
-    else
-        open_edge_test();
-    return 1;
+// The window the screen's shape asks for (GUI thread).
+void *open_by_shape(void) {
+    return g_bTPShape == 1 ? mmi_testwnd_touch_circlegrid_Entry() : open_edge_test();
 }
 
-int stop_on_gui(void *) {
-    HWND hWnd = s_wnd.hwnd.load();
-    if (hWnd == HWND_INVALID) {
-        TOUCH_ERROR("%s: no touch test open", "mmi_AutoTest_touchscreenTest_Stop_Entry");
-        return 0;
-    }
-    int verdict;
-    if (s_round) {
-        verdict = all_touched() ? 1 : 0;
+// The PC's verdict (GUI thread): every cell, or every sector of both rings, touched.
+int touch_verdict(char *, unsigned int) {
+    if (s_round)
         TOUCH_DEBUG("0607_2 %s g_inner_circles[0].iClickedNum=%d,g_inner_circles[0].divided_num=%d",
                     "circleTouch_Stop", g_inner_circles.iClickedNum,
                     g_inner_circles.outer.divided_num);
-    } else {
-        verdict = cells.drawCount >= cells.totalCount ? 1 : 0;
-    }
-    close_window(hWnd);
-    return verdict;
+    return all_touched() ? 1 : 0;
 }
 
 int pc_open(void) {
-    return mmi_ownwnd_pc_open(&s_wnd, open_on_gui, nullptr);
+    return mmi_ownwnd_pc_open(&s_wnd, open_by_shape);
 }
 
 int pc_stop(void) {
-    const int verdict = mmi_RunOnGuiThread(stop_on_gui, nullptr);
-    tp_os_usleep(100000);
-    return verdict;
+    const int verdict = mmi_ownwnd_pc_stop(&s_wnd, touch_verdict, nullptr, 0);
+    if (verdict < 0)
+        TOUCH_ERROR("%s: no touch test open", "mmi_AutoTest_touchscreenTest_Stop_Entry");
+    return verdict > 0 ? 1 : 0;
 }
 
 }  // namespace
@@ -428,8 +394,7 @@ void mmi_touch_read_config(void) {
 void *mmi_testwnd_touchTestEntry(void) {
     s_wnd.pcDriven = 0;
     mmi_touch_read_config();
-    if (g_bTPShape == 1) return mmi_testwnd_touch_circlegrid_Entry();
-    return open_edge_test();
+    return open_by_shape();
 }
 
 void *mmi_testwnd_touch_circlegrid_Entry(void) {

@@ -45,6 +45,20 @@ enum {
     kMakerUnsupported = -4,
 };
 
+// The verdicts with a text of their own; the others are failure bits.
+struct VerdictText {
+    int verdict;
+    const char *key;
+    bool pass;
+};
+const VerdictText kVerdicts[] = {
+    {kRawNormal, "info_rawdata", true},
+    {kMakerUnsupported, "info_NotSupportManufacturerModule", true},
+    {kTypeUnsupported, "info_NotSupportCurrentModuleType", true},
+    {kRawReadFail, "info_GetRawDataFail", true},
+    {kLoadFail, "info_LoadDllFail", false},
+};
+
 struct BitText {
     int bit;
     const char *key;
@@ -262,10 +276,7 @@ LRESULT mmi_TPSelfTestWndProc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lPa
             s_preview = 0;
             s_arrived = 0;
             if (hw::ftx_api_tpd_SelfTest_Stop) hw::ftx_api_tpd_SelfTest_Stop();
-            mmi_set_current_test("");
-            mmi_testwnd_unregister(hWnd);
-            s_wnd.hwnd = HWND_INVALID;
-            DestroyMainWindow(hWnd);
+            mmi_ownwnd_destroy(&s_wnd, hWnd);
             return 0;
         }
         default:
@@ -305,10 +316,10 @@ void paint_map(HWND hWnd) {
     std::lock_guard<std::mutex> lk(s_rawLock);
     const mmi_tp_raw &raw = g_TPSelfRawFailData;
     if (raw.x > 0 && raw.y > 0 && raw.num > 0 && raw.p != nullptr) {
-        const int cw = w / raw.x, ch = h / raw.y;
         SetBrushColor(hdc, mmi_pixel(MMI_COLOUR_FAIL));
-        for (int i = 0; i + 1 < raw.filled; i += 2)
-            FillBox(hdc, (int)raw.p[i] * w / raw.x, (int)raw.p[i + 1] * h / raw.y, cw, ch);
+        int box[4];
+        for (int i = 0; 2 * i + 1 < raw.filled; i++)
+            if (mmi_tp_raw_cell(&raw, i, w, h, box) == 0) FillBox(hdc, box[0], box[1], box[2], box[3]);
     } else {
         SetBkMode(hdc, BM_TRANSPARENT);
         SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
@@ -353,27 +364,14 @@ LRESULT map_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
 
 int mmi_tp_verdict_detail(int verdict, char *out, unsigned int size, bool translate) {
     out[0] = '\0';
-    switch (verdict) {
-        case kRawNormal:
-            add_text(out, size, "info_rawdata", translate);
-            return 1;
-        case kMakerUnsupported:
-            add_text(out, size, "info_NotSupportManufacturerModule", translate);
-            return 1;
-        case kTypeUnsupported:
-            add_text(out, size, "info_NotSupportCurrentModuleType", translate);
-            return 1;
-        case kRawReadFail:
-            add_text(out, size, "info_GetRawDataFail", translate);
-            return 1;
-        case kLoadFail:
-            add_text(out, size, "info_LoadDllFail", translate);
-            return 0;
-        default:
-            for (const BitText &b : kBits)
-                if (((unsigned)verdict >> b.bit) & 1u) add_text(out, size, b.key, translate);
-            return 0;
+    for (const VerdictText &v : kVerdicts) {
+        if (v.verdict != verdict) continue;
+        add_text(out, size, v.key, translate);
+        return v.pass ? 1 : 0;
     }
+    for (const BitText &b : kBits)
+        if (((unsigned)verdict >> b.bit) & 1u) add_text(out, size, b.key, translate);
+    return 0;
 }
 
 void tpd_auto_test_callback(module_data *data) {
@@ -429,23 +427,9 @@ int mmi_testwnd_Monomer_TPSelfTest_Stop(void) {
 
 void *mmi_TP_RawDataDetail_Entry(void) {
     __android_log_print(ANDROID_LOG_DEBUG, kMapTag, "%s begin", __func__);
-    MAINWINCREATE create;
-    memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_VISIBLE | WS_CAPTION;
-    create.dwExStyle = WS_EX_TOPMOST;
-    create.spCaption = " ";
-    create.hHosting = mmi_guithread_window();
-    create.MainWindowProc = map_proc;
-    create.rx = g_ptScreenInfo.width;
-    create.by = g_ptScreenInfo.height;
-    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
-    HWND hWnd = CreateMainWindow(&create);
-    if (hWnd == HWND_INVALID) {
-        __android_log_print(ANDROID_LOG_ERROR, kMapTag, "%s CreateMainWindow fail", __func__);
-        return hWnd;
-    }
-    s_map.hwnd = hWnd;
     tp_skb_show(0);
-    ShowWindow(hWnd, SW_SHOWNORMAL);
+    HWND hWnd = mmi_testwnd_create_full(" ", map_proc, 0);
+    if (hWnd == HWND_INVALID) return hWnd;
+    s_map.hwnd = hWnd;
     return hWnd;
 }

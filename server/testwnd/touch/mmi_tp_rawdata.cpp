@@ -34,6 +34,18 @@ void mmi_tp_raw_free(mmi_tp_raw *raw) {
     memset(raw, 0, sizeof(*raw));
 }
 
+int mmi_tp_raw_cell(const mmi_tp_raw *raw, int point, int w, int h, int box[4]) {
+    if (raw->x <= 0 || raw->y <= 0 || raw->p == nullptr || point < 0) return -1;
+    if ((int64_t)point * 2 + 1 >= raw->filled) return -1;
+    const uint32_t px = raw->p[2 * point], py = raw->p[2 * point + 1];
+    if (px >= (uint32_t)raw->x || py >= (uint32_t)raw->y) return -1;
+    box[0] = (int)((int64_t)px * w / raw->x);
+    box[1] = (int)((int64_t)py * h / raw->y);
+    box[2] = w / raw->x;
+    box[3] = h / raw->y;
+    return 0;
+}
+
 int mmi_tp_raw_parse(const char *text, mmi_tp_raw *out, const char *tag) {
     mmi_tp_raw_free(out);
     if (text == nullptr) return -1;

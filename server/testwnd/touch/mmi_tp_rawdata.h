@@ -18,3 +18,6 @@ struct mmi_tp_raw {
 // x, y or num is missing (out then holds what was read before the gap, no array).
 int mmi_tp_raw_parse(const char *text, mmi_tp_raw *out, const char *tag);
 void mmi_tp_raw_free(mmi_tp_raw *raw);
+// The screen box (x, y, width, height) of failing point `point` on a w x h screen; -1 when
+// the grid is empty or the point is outside it or was not read.
+int mmi_tp_raw_cell(const mmi_tp_raw *raw, int point, int w, int h, int box[4]);

@@ -178,5 +178,5 @@ TEST(HookKey, TheLibrarysPressPassesTheTestForTheOperatorAndThePc) {
     ASSERT_TRUE(h.dut.consoleOk("hw hook press"));
     h.shotWhen("hook_operator.png", pass_label);
     h.key(60);
-    EXPECT_TRUE(h.waitActive("Device Test"));
+    EXPECT_TRUE(h.waitActive("Device Test")) << h.dut.console("windows");
 }

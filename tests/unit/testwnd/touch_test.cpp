@@ -143,6 +143,20 @@ TEST(TpRawData, TheTextGivesTheGridAndThePointsSkippingEmptyFields) {
     mmi_tp_raw_free(&raw);
 }
 
+TEST(TpRawData, AFailingPointIsItsGridCellOnTheScreenAndPointsOffTheGridAreLeftOut) {
+    mmi_tp_raw raw{};
+    ASSERT_EQ(0, mmi_tp_raw_parse("4,8,3,3,7,4,0,4000000000,1", &raw, kTag));
+    int box[4];
+    ASSERT_EQ(0, mmi_tp_raw_cell(&raw, 0, 720, 1280, box));
+    EXPECT_EQ((std::vector<int>{540, 1120, 180, 160}), std::vector<int>(box, box + 4));
+    EXPECT_EQ(-1, mmi_tp_raw_cell(&raw, 1, 720, 1280, box));  // column 4 of 0..3
+    EXPECT_EQ(-1, mmi_tp_raw_cell(&raw, 2, 720, 1280, box));
+    EXPECT_EQ(-1, mmi_tp_raw_cell(&raw, 3, 720, 1280, box));  // never announced
+    ASSERT_EQ(0, mmi_tp_raw_parse("0,8,1,0,0", &raw, kTag));
+    EXPECT_EQ(-1, mmi_tp_raw_cell(&raw, 0, 720, 1280, box));
+    mmi_tp_raw_free(&raw);
+}
+
 TEST(TpVerdict, EachVerdictHasItsLinesAndOnlyFourPass) {
     char out[512];
     EXPECT_EQ(1, mmi_tp_verdict_detail(0, out, sizeof(out), false));
