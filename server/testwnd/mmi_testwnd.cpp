@@ -346,6 +346,20 @@ void mmi_ownwnd_close(mmi_ownwnd_state *st) {
     mmi_RunOnGuiThread(close_own, st);
 }
 
+HWND mmi_ownwnd_opened(mmi_ownwnd_state *st, HWND hWnd, int (*stop)(void)) {
+    if (hWnd == HWND_INVALID) return hWnd;
+    st->hwnd = hWnd;
+    mmi_testwnd_register_open(hWnd, stop);
+    ShowWindow(hWnd, SW_SHOWNORMAL);
+    return hWnd;
+}
+
+int mmi_ownwnd_stop(mmi_ownwnd_state *st) {
+    mmi_ownwnd_close(st);
+    tp_os_usleep(100000);
+    return 1;
+}
+
 void *WaitForFoolProof(void *arg) {
     mmi_testwnd_state *st = static_cast<mmi_testwnd_state *>(arg);
     const unsigned generation = st->generation.load();

@@ -139,6 +139,11 @@ void mmi_ownwnd_destroy(mmi_ownwnd_state *st, HWND hWnd);
 bool mmi_ownwnd_refuses(mmi_ownwnd_state *st, UINT message, const char *tag);
 // Sends MSG_CLOSE to the window, when there is one, on the GUI thread.
 void mmi_ownwnd_close(mmi_ownwnd_state *st);
+// The end of such a window's open: the handle kept, the stop entry registered, the window
+// shown. Returns hWnd (HWND_INVALID passes through untouched).
+HWND mmi_ownwnd_opened(mmi_ownwnd_state *st, HWND hWnd, int (*stop)(void));
+// The stop entry's common form: the window closed, 100 ms for it to go; answers 1.
+int mmi_ownwnd_stop(mmi_ownwnd_state *st);
 
 // The soft keys (palette text colour) and, unless titleKey is null, the title strip.
 void mmi_testwnd_set_bars(HWND hWnd, const char *titleKey, const char *left, const char *middle,

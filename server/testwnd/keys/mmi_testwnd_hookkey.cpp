@@ -190,11 +190,8 @@ void *mmi_teswnd_HookKeyTest(void) {
     init_Hookkeyrect();
     // Without the library's calls the operator's key still passes the test.
     load_lib_interface_hookkey(kTag);
-    HWND hWnd = mmi_testwnd_create("Hook Key Test", hook_proc, 0);
-    if (hWnd == HWND_INVALID) return hWnd;
-    mmi_testwnd_register_open(hWnd, mmi_teswnd_HookKeyTest_Stop_Entry);
-    ShowWindow(hWnd, SW_SHOWNORMAL);
-    return hWnd;
+    return mmi_ownwnd_opened(&s_wnd, mmi_testwnd_create("Hook Key Test", hook_proc, 0),
+                             mmi_teswnd_HookKeyTest_Stop_Entry);
 }
 
 void *mmi_teswnd_HookKeyTestEntry(void) {
@@ -203,9 +200,7 @@ void *mmi_teswnd_HookKeyTestEntry(void) {
 }
 
 int mmi_teswnd_HookKeyTest_Stop_Entry(void) {
-    mmi_ownwnd_close(&s_wnd);
-    tp_os_usleep(100000);
-    return 1;
+    return mmi_ownwnd_stop(&s_wnd);
 }
 
 void hookkey_test_callback(unsigned int *status) {

@@ -222,11 +222,7 @@ void *mmi_teswnd_KeyTest(void) {
     s_allDone = 0;
     HWND hWnd = mmi_testwnd_create("Key Test", key_proc, 0);
     s_wnd.created = 1;  // also after a failure: a PC stop then answers from the table
-    if (hWnd == HWND_INVALID) return hWnd;
-    s_wnd.hwnd = hWnd;
-    mmi_testwnd_register_open(hWnd, mmi_teswnd_KeyTest_Stop_Entry);
-    ShowWindow(hWnd, SW_SHOWNORMAL);
-    return hWnd;
+    return mmi_ownwnd_opened(&s_wnd, hWnd, mmi_teswnd_KeyTest_Stop_Entry);
 }
 
 void *mmi_teswnd_KeyTestEntry(void) {
@@ -235,9 +231,7 @@ void *mmi_teswnd_KeyTestEntry(void) {
 }
 
 int mmi_teswnd_KeyTest_Stop_Entry(void) {
-    mmi_ownwnd_close(&s_wnd);
-    tp_os_usleep(100000);
-    return 1;
+    return mmi_ownwnd_stop(&s_wnd);
 }
 
 // ---- key events ----
@@ -305,8 +299,7 @@ int PCBAKeyTestStart(void) {
         tp_os_usleep(500000);
     const int done = s_allDone.load();
     KEY_DEBUG("%s::all keys done=%d", __func__, done);
-    mmi_ownwnd_close(&s_wnd);
-    tp_os_usleep(100000);
+    mmi_ownwnd_stop(&s_wnd);
     s_pcba = 0;
     return done;
 }

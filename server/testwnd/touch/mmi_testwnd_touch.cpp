@@ -315,10 +315,7 @@ LRESULT mmi_TouchAdjusting_CircleGridProc(HWND hWnd, UINT message, WPARAM wParam
 // The full-screen window, shown; HWND_INVALID on failure.
 HWND create_window(WNDPROC proc) {
     HWND hWnd = mmi_testwnd_create_full("Touch Test", proc, 0);
-    if (hWnd == HWND_INVALID) return hWnd;
-    s_wnd.hwnd = hWnd;
-    mmi_testwnd_register_open(hWnd, mmi_AutoTest_touchscreenTest_Stop_Entry);
-    return hWnd;
+    return mmi_ownwnd_opened(&s_wnd, hWnd, mmi_AutoTest_touchscreenTest_Stop_Entry);
 }
 
 HWND open_edge_test(void) {
@@ -410,9 +407,7 @@ void *mmi_testwnd_Monomer_touchTestEntry(void) {
 
 int mmi_testwnd_Monomer_touchscreenTest_Stop(void) {
     s_preview = 0;
-    mmi_ownwnd_close(&s_wnd);
-    tp_os_usleep(100000);
-    return 1;
+    return mmi_ownwnd_stop(&s_wnd);
 }
 
 int RectangleTouch_Start(void) {

@@ -319,7 +319,8 @@ void paint_map(HWND hWnd) {
         SetBrushColor(hdc, mmi_pixel(MMI_COLOUR_FAIL));
         int box[4];
         for (int i = 0; 2 * i + 1 < raw.filled; i++)
-            if (mmi_tp_raw_cell(&raw, i, w, h, box) == 0) FillBox(hdc, box[0], box[1], box[2], box[3]);
+            if (mmi_tp_raw_cell(&raw, i, w, h, box) == 0)
+                FillBox(hdc, box[0], box[1], box[2], box[3]);
     } else {
         SetBkMode(hdc, BM_TRANSPARENT);
         SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
@@ -400,19 +401,13 @@ void *mmi_testwnd_TPSelfTest_Entry(void) {
     mmi_translate("title_TPSelfTest", s.title, sizeof(s.title));
     mmi_translate("info_NoTouch", s.noTouch, sizeof(s.noTouch));
     mmi_translate("info_Detail", s.detailKey, sizeof(s.detailKey));
-    HWND hWnd = mmi_testwnd_create("TP Self Test", mmi_TPSelfTestWndProc, 0);
-    if (hWnd == HWND_INVALID) return hWnd;
-    s_wnd.hwnd = hWnd;
-    mmi_testwnd_register_open(hWnd, mmi_testwnd_TPSelfTest_Stop);
-    ShowWindow(hWnd, SW_SHOWNORMAL);
-    return hWnd;
+    return mmi_ownwnd_opened(&s_wnd, mmi_testwnd_create("TP Self Test", mmi_TPSelfTestWndProc, 0),
+                             mmi_testwnd_TPSelfTest_Stop);
 }
 
 int mmi_testwnd_TPSelfTest_Stop(void) {
     mmi_ownwnd_close(&s_map);
-    mmi_ownwnd_close(&s_wnd);
-    tp_os_usleep(100000);
-    return 1;
+    return mmi_ownwnd_stop(&s_wnd);
 }
 
 void *mmi_testwnd_Monomer_TPSelfTest_Entry(void) {
