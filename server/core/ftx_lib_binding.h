@@ -61,6 +61,9 @@
     X(ftx_api_FM_Get_Vol)                                       \
     X(ftx_api_Audio_Receiver_Start)                             \
     X(ftx_api_Audio_Receiver_Stop)                              \
+    X(ftx_api_Audio_MainMicRecord_Start)                        \
+    X(ftx_api_Audio_MainMicRecord_Play)                         \
+    X(ftx_api_Audio_MainMicRecord_Stop)                         \
     X(ftx_api_USB_OTG_Test_START)                               \
     X(ftx_api_USB_OTG_Test_Stop)                                \
     X(ftx_api_SetSystemIdleStatus)                              \

@@ -4,9 +4,13 @@
 
 #include <stddef.h>
 
-#include "pending/audio.h"
 #include "pending/camera.h"
 #include "pending/cards.h"
+#include "testwnd/audio/mmi_testwnd_fm.h"
+#include "testwnd/audio/mmi_testwnd_loopback.h"
+#include "testwnd/audio/mmi_testwnd_mainmic.h"
+#include "testwnd/audio/mmi_testwnd_ring.h"
+#include "testwnd/audio/mmi_testwnd_smartpa.h"
 #include "testwnd/display/mmi_testwnd_auxlcdhint.h"
 #include "testwnd/display/mmi_testwnd_lcd.h"
 #include "testwnd/keys/mmi_testwnd_hookkey.h"

@@ -78,6 +78,7 @@ int close_window(void *hWnd) {
 
 void hw_stop(const mmi_testwnd_desc *d) {
     if (d->stop.bound()) (*d->stop.op)();
+    if (d->stopWithMode.bound()) (*d->stopWithMode.op)(d->state->mode.load());
 }
 
 const char *domain_of(const mmi_testwnd_desc *d) {
@@ -445,6 +446,8 @@ void mmi_testwnd_fail(const mmi_testwnd_desc *d) {
 LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     const mmi_testwnd_desc *d = desc_of(hWnd);
     const int w = g_ptScreenInfo.width, h = g_ptScreenInfo.height;
+    if (d != nullptr && d->hook && message != MSG_CREATE && d->hook(hWnd, message, wParam, lParam))
+        return 0;
     switch (message) {
         case MSG_CREATE: {
             d = reinterpret_cast<const mmi_testwnd_desc *>(
@@ -453,6 +456,7 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             d->state->hwnd = hWnd;
             if (d->start.bound()) (*d->start.op)(d->state->mode.load());
             mmi_set_current_test(domain_of(d));
+            if (d->hook) d->hook(hWnd, message, wParam, lParam);
             break;
         }
         case MSG_TIMER:

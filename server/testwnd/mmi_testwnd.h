@@ -61,13 +61,17 @@ struct mmi_testwnd_desc {
     int foolProofSeconds = 0;        // before the pass label shows
     mmi_hw_start_op start = {};      // hardware start, given the mode variable
     mmi_hw_stop_op stop = {};
-    int stopEntrySleepMs = 0;  // after the stop entry closed the window
-    int pcStopSleepMs = 0;     // after the PC stop entry
+    mmi_hw_start_op stopWithMode = {};  // a stop that is given the mode (instead of stop)
+    int stopEntrySleepMs = 0;           // after the stop entry closed the window
+    int pcStopSleepMs = 0;              // after the PC stop entry
     mmi_testwnd_state *state = nullptr;
     int (*stopEntry)(void) = nullptr;                      // closes the window from outside
     int run = MMI_RUN_AUTO;                                // the run a pass or fail is reported to
     int (*bind)(void) = nullptr;                           // per-feature binder, null when none
     void (*note)(char *out, unsigned int size) = nullptr;  // body text instead of noteKey
+    // Sees every message first (after MSG_CREATE's own work, before MSG_CLOSE's); non-zero
+    // when it handled the message, which the common procedure then leaves alone.
+    int (*hook)(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) = nullptr;
 };
 
 #define MMI_TESTWND_NOTE_SIZE 1024

@@ -39,6 +39,13 @@ int start_cb(const char *op, ftx_api_module_cb cb, const char *extra = "") {
     return rc;
 }
 
+// An audio operation: recorded with the model's answer (unless one is forced), then, when
+// it succeeds, the route it starts or ends.
+int sound(const char *op, int rc, int arg = 0, int out = 0) {
+    if (rc == 0) model().audio_route(op, arg, out);
+    return rc;
+}
+
 }  // namespace
 
 #define SIM_PLAIN(name)         \
@@ -52,6 +59,19 @@ int start_cb(const char *op, ftx_api_module_cb cb, const char *extra = "") {
 #define SIM_INT(name, arg)                      \
     extern "C" int name(int arg) {              \
         return call(#name, 0, #arg "=%d", arg); \
+    }
+#define SIM_AUDIO(name)                                                      \
+    extern "C" int name(void) {                                              \
+        return sound(#name, call(#name, model().audio_answer(#name, 0, 0))); \
+    }
+#define SIM_AUDIO_INT(name, arg)                                                               \
+    extern "C" int name(int arg) {                                                             \
+        return sound(#name, call(#name, model().audio_answer(#name, arg, 0), #arg "=%d", arg), \
+                     arg);                                                                     \
+    }
+#define SIM_AUDIO_CB(name)                        \
+    extern "C" int name(ftx_api_module_cb cb) {   \
+        return sound(#name, start_cb(#name, cb)); \
     }
 
 // ---- start-up set ----
@@ -152,29 +172,30 @@ SIM_PLAIN(ftx_api_AllCard_Test_Stop)
 SIM_CB(ftx_api_Sensors_Test_Start)
 SIM_PLAIN(ftx_api_Sensors_Test_Stop)
 SIM_INT(ftx_api_Sensors_Calibration, sensor)
-SIM_INT(ftx_api_Audio_RingTest_Start, ring_type)
-SIM_INT(ftx_api_Audio_RingTest_Stop, arg)
-SIM_PLAIN(ftx_api_Audio_HiFiTest_Start)
-SIM_PLAIN(ftx_api_Audio_HiFiTest_Stop)
+SIM_AUDIO_INT(ftx_api_Audio_RingTest_Start, ring_type)
+SIM_AUDIO_INT(ftx_api_Audio_RingTest_Stop, arg)
+SIM_AUDIO(ftx_api_Audio_HiFiTest_Start)
+SIM_AUDIO(ftx_api_Audio_HiFiTest_Stop)
 extern "C" int ftx_api_Audio_HiFiTest_auto_Start(const char *parm) {
-    return call("ftx_api_Audio_HiFiTest_auto_Start", 0, "%s", parm != nullptr ? parm : "");
+    const char *op = "ftx_api_Audio_HiFiTest_auto_Start";
+    return sound(op, call(op, model().audio_answer(op, 0, 0), "%s", parm != nullptr ? parm : ""));
 }
-SIM_PLAIN(ftx_api_Audio_HiFiTest_auto_Stop)
-SIM_CB(ftx_api_Audio_Acoustic_Loopback_Test_Start)
-SIM_PLAIN(ftx_api_Audio_Acoustic_Loopback_Test_Stop)
-SIM_CB(ftx_api_Audio_wakeupMic_on_Start)
-SIM_PLAIN(ftx_api_Audio_wakeupMic_Stop)
-SIM_CB(ftx_api_Audio_Acoustic_Loopback_Auxiliary_MIC_Test_Start)
-SIM_PLAIN(ftx_api_Audio_Acoustic_Loopback_Auxiliary_MIC_Test_Stop)
-SIM_CB(ftx_api_Audio_Acoustic_Loopback_Speaker_Test_Start)
-SIM_CB(ftx_api_Audio_Acoustic_Loopback_Two_Speaker_Test_Start)
-SIM_CB(ftx_api_Audio_Acoustic_Loopback_Headset_Test_Start)
-SIM_PLAIN(ftx_api_Audio_Acoustic_Loopback_Headset_Test_Stop)
+SIM_AUDIO(ftx_api_Audio_HiFiTest_auto_Stop)
+SIM_AUDIO_CB(ftx_api_Audio_Acoustic_Loopback_Test_Start)
+SIM_AUDIO(ftx_api_Audio_Acoustic_Loopback_Test_Stop)
+SIM_AUDIO_CB(ftx_api_Audio_wakeupMic_on_Start)
+SIM_AUDIO(ftx_api_Audio_wakeupMic_Stop)
+SIM_AUDIO_CB(ftx_api_Audio_Acoustic_Loopback_Auxiliary_MIC_Test_Start)
+SIM_AUDIO(ftx_api_Audio_Acoustic_Loopback_Auxiliary_MIC_Test_Stop)
+SIM_AUDIO_CB(ftx_api_Audio_Acoustic_Loopback_Speaker_Test_Start)
+SIM_AUDIO_CB(ftx_api_Audio_Acoustic_Loopback_Two_Speaker_Test_Start)
+SIM_AUDIO_CB(ftx_api_Audio_Acoustic_Loopback_Headset_Test_Start)
+SIM_AUDIO(ftx_api_Audio_Acoustic_Loopback_Headset_Test_Stop)
 extern "C" int ftx_api_GetHeadsetState(void) {
     return call("ftx_api_GetHeadsetState", model().headset());
 }
-SIM_INT(ftx_api_FM_Test_Start, frequency)
-SIM_PLAIN(ftx_api_FM_Test_Stop)
+SIM_AUDIO_INT(ftx_api_FM_Test_Start, frequency)
+SIM_AUDIO(ftx_api_FM_Test_Stop)
 extern "C" int ftx_api_FM_Set_Vol(int volume) {
     int rc = call("ftx_api_FM_Set_Vol", 0, "%d", volume);
     if (rc == 0) ftxsim::put_value("fm.volume", volume);
@@ -183,41 +204,40 @@ extern "C" int ftx_api_FM_Set_Vol(int volume) {
 extern "C" int ftx_api_FM_Get_Vol(void) {
     return call("ftx_api_FM_Get_Vol", static_cast<int>(ftxsim::get_value("fm.volume", 8)));
 }
-SIM_INT(ftx_api_Audio_Receiver_Start, ring_type)
-SIM_PLAIN(ftx_api_Audio_Receiver_Stop)
+SIM_AUDIO_INT(ftx_api_Audio_Receiver_Start, ring_type)
+SIM_AUDIO(ftx_api_Audio_Receiver_Stop)
+SIM_AUDIO_INT(ftx_api_Audio_MainMicRecord_Start, seconds)
+SIM_AUDIO(ftx_api_Audio_MainMicRecord_Play)
+SIM_AUDIO(ftx_api_Audio_MainMicRecord_Stop)
 SIM_CB(ftx_api_USB_OTG_Test_START)
 SIM_PLAIN(ftx_api_USB_OTG_Test_Stop)
 SIM_INT(ftx_api_SetSystemIdleStatus, idle)
 
-namespace {
-std::string volume_key(int microphone, int output) {
-    return "audio.volume." + std::to_string(microphone) + "." + std::to_string(output);
-}
-}  // namespace
-
 extern "C" int ftx_api_Audio_SetVolume(int microphone, int output, int level) {
     int rc = call("ftx_api_Audio_SetVolume", 0, "%d,%d,%d", microphone, output, level);
-    if (rc == 0) ftxsim::put_value(volume_key(microphone, output).c_str(), level);
+    if (rc == 0) model().set_volume(microphone, output, level);
     return rc;
 }
 extern "C" int ftx_api_Audio_GetVolume(int microphone, int output) {
-    int level = static_cast<int>(ftxsim::get_value(volume_key(microphone, output).c_str(), 5));
-    return call("ftx_api_Audio_GetVolume", level, "%d,%d", microphone, output);
+    return call("ftx_api_Audio_GetVolume", model().volume(microphone, output), "%d,%d", microphone,
+                output);
 }
 SIM_PLAIN(ftx_api_EnterLowCostMode)
 
 // ---- per-feature sets ----
 extern "C" int ftx_api_Audio_Loopback_Test_Start(int microphone, int output, const char *parm,
                                                  ftx_api_module_cb cb) {
-    int rc = call("ftx_api_Audio_Loopback_Test_Start", 0, "%d,%d,%s,cb=%p", microphone, output,
-                  parm != nullptr ? parm : "", reinterpret_cast<void *>(cb));
-    model().remember("ftx_api_Audio_Loopback_Test_Start", cb);
-    if (rc == 0) model().send_headset();
+    const char *op = "ftx_api_Audio_Loopback_Test_Start";
+    int rc = call(op, model().audio_answer(op, microphone, output), "%d,%d,%s,cb=%p", microphone,
+                  output, parm != nullptr ? parm : "", reinterpret_cast<void *>(cb));
+    model().remember(op, cb);
+    if (sound(op, rc, microphone, output) == 0) model().send_headset();
     return rc;
 }
 extern "C" int ftx_api_Audio_Loopback_Test_Stop(int microphone, int output) {
+    const char *op = "ftx_api_Audio_Loopback_Test_Stop";
     model().remember("ftx_api_Audio_Loopback_Test_Start", nullptr);
-    return call("ftx_api_Audio_Loopback_Test_Stop", 0, "%d,%d", microphone, output);
+    return sound(op, call(op, 0, "%d,%d", microphone, output), microphone, output);
 }
 extern "C" int ftx_api_HookKeyTest_Start(ftx_api_hookkey_cb cb) {
     model().set_hook_cb(cb);
@@ -363,7 +383,7 @@ extern "C" int ftx_api_wgb_start(int group, int on) {
 }
 SIM_CB(ftx_api_fm_start)
 SIM_PLAIN(ftx_api_fm_stop)
-SIM_PLAIN(ftx_api_mic2earpiece_start)
-SIM_PLAIN(ftx_api_mic2earpiece_stop)
-SIM_PLAIN(ftx_api_auxmic2earpiece_start)
-SIM_PLAIN(ftx_api_auxmic2earpiece_stop)
+SIM_AUDIO(ftx_api_mic2earpiece_start)
+SIM_AUDIO(ftx_api_mic2earpiece_stop)
+SIM_AUDIO(ftx_api_auxmic2earpiece_start)
+SIM_AUDIO(ftx_api_auxmic2earpiece_stop)

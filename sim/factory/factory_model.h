@@ -21,6 +21,16 @@ class FactoryModel {
     void send_module_status(const char *module);
 
     int headset();
+    // The audio routes. audio_answer is the model's answer to an audio operation before it
+    // runs: -1 for HiFi without a headset, a record of other than 1..10 seconds, a play with
+    // nothing recorded, a loopback of unknown codes; else 0. audio_route starts or ends what op
+    // plays; arg is its number (ring type, frequency, seconds, a loopback's microphone code),
+    // out a loopback's output code.
+    int audio_answer(const char *op, int arg, int out);
+    void audio_route(const char *op, int arg, int out);
+    // A route's volume level: 0..15 (a level out of range is clamped), 5 until set.
+    void set_volume(int microphone, int output, int level);
+    int volume(int microphone, int output);
     // Sets the hook callback; returns the presses counted since the previous set.
     int set_hook_cb(ftx_api_hookkey_cb cb);
     bool camera_ok(int id);

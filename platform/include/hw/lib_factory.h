@@ -133,6 +133,12 @@ int ftx_api_FM_Set_Vol(int volume);
 int ftx_api_FM_Get_Vol(void);
 int ftx_api_Audio_Receiver_Start(int ring_type);
 int ftx_api_Audio_Receiver_Stop(void);
+/* Main-microphone record: Start records `seconds` of what the main microphone hears (the
+ * recording is ready when the seconds have passed); Play plays the recording on the speaker;
+ * Stop ends either. 0 on success; Play fails while nothing was recorded. */
+int ftx_api_Audio_MainMicRecord_Start(int seconds);
+int ftx_api_Audio_MainMicRecord_Play(void);
+int ftx_api_Audio_MainMicRecord_Stop(void);
 int ftx_api_USB_OTG_Test_START(ftx_api_module_cb cb);
 int ftx_api_USB_OTG_Test_Stop(void);
 int ftx_api_SetSystemIdleStatus(int idle);

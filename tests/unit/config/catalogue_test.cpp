@@ -10,7 +10,7 @@
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
 #include "mmi_startup.h"
-#include "pending/audio.h"
+#include "testwnd/audio/mmi_testwnd_ring.h"
 #include "testwnd/display/mmi_testwnd_auxlcdhint.h"
 #include "testwnd/display/mmi_testwnd_lcd.h"
 #include "pending/sensors.h"
