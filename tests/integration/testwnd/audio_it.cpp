@@ -322,3 +322,67 @@ TEST(FmTest, TheVolumeKeysTuneTheConfiguredStationsInOrder) {
     EXPECT_TRUE(has(h.dut.console("hw audio"), "fm=875@"));
     EXPECT_EQ(0, h.dut.pc("FMMoudle testItem close").first);
 }
+
+TEST(AudioWindows, EachToneWindowPlaysOpensInARunAndRecordsItsItem) {
+    const struct {
+        const char *domain, *caption, *wav;
+        int hz, resultItem;
+        const char *parameter;
+    } kWindows[] = {
+        {"FTX_RINGTONE", "Ringtone Test", "speaker", 1000, 296, nullptr},
+        {"FTX_RTUP", "Ringtone Up Test", "speaker", 800, 296, "RingType:3"},
+        {"FTX_RTDOWN", "Ringtone Down Test", "speaker", 1500, 296, "RingType:1"},
+        {"FTX_RECEIVER", "Receiver Test", "receiver", 2000, 298, "RingType:2"},
+        {"FTX_HIFI", "CAMERA WIN", "headset", 3000, 368, nullptr},
+        {"FTX_AUDIO_MAINMICRECORD", "MainMic Record Test", "speaker", 440, -1, nullptr},
+        {"FTX_SMARTPACAL", "SmartPA Calibration", nullptr, 0, 300, nullptr},
+        {"FTX_AUDIO_LOOPBACK", "Speaker", "upspeaker", 440, 300,
+         "AuxiliaryMIC:0;WakeupMIC:0;TwoSpeaker:1"},
+    };
+    for (const auto &w : kWindows) {
+        SCOPED_TRACE(w.domain);
+        // An item without a result is opened alone (the card item comes before it in a run).
+        const bool run = w.resultItem > 0;
+        Handset h = run ? Handset({{w.domain, 1, 0, 1}, kCards}) : Handset({{w.domain, 1, 0, 1}});
+        if (w.parameter != nullptr) h.dut.setConfig(w.domain, "parameter", w.parameter);
+        ASSERT_TRUE(h.start());
+        ASSERT_TRUE(h.dut.waitChannel());
+        ASSERT_TRUE(h.fromList(run ? 0 : 4, w.caption));
+        h.shotWhen("tone.png", pass_label);
+        if (w.wav != nullptr) {
+            const std::string wav = h.dut.host(std::string("/sim/audio/") + w.wav + ".wav");
+            EXPECT_EQ(w.hz, dominant_hz(wav_samples(wav)));
+        }
+        h.key(60);
+        if (!run) {
+            EXPECT_TRUE(h.waitActive("Device Test"));
+            continue;
+        }
+        ASSERT_TRUE(h.dut.waitLog(kCardsOpened));
+        EXPECT_EQ(1, h.result(w.resultItem));
+    }
+}
+
+TEST(AudioWindows, AFailedCalibrationAndHiFiWithoutAHeadsetOfferOnlyFail) {
+    Handset h({{"FTX_HIFI", 1, 0, 1}, {"FTX_SMARTPACAL", 1, 0, 1}});
+    ASSERT_TRUE(h.start());
+    ASSERT_TRUE(h.dut.waitChannel());
+    ASSERT_TRUE(h.dut.consoleOk("hw headset 0"));
+    ASSERT_TRUE(h.dut.consoleOk("hw pa fail"));
+    ASSERT_TRUE(h.fromList(4, "SmartPA Calibration"));
+    ASSERT_TRUE(h.dut.waitLog("result=fail;value=0 result=0"));
+    Png pa = h.shotWhen("pa.png", fail_label);
+    EXPECT_FALSE(pass_label(pa));
+    h.key(61);
+    ASSERT_TRUE(h.waitActive("Device Test"));
+    h.chooseRow(1);  // HiFi, one row below
+    ASSERT_TRUE(h.waitActive("CAMERA WIN"));
+    ASSERT_TRUE(h.dut.waitLog("hifi_hook::headset=0"));
+    Png hifi = h.shotWhen("hifi.png", fail_label);
+    EXPECT_FALSE(pass_label(hifi));
+    EXPECT_FALSE(has(h.dut.console("hw audio"), "hifi=on"));
+    h.key(60);  // refused
+    EXPECT_FALSE(h.waitActive("Device Test", 300));
+    h.key(61);
+    EXPECT_TRUE(h.waitActive("Device Test"));
+}
