@@ -460,9 +460,10 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) 
             break;
         }
         case MSG_TIMER:
-            mmi_testwnd_show_keys(hWnd, title_of(d), wParam);
+            mmi_testwnd_show_keys(hWnd, title_of(d), d->passReady && !d->passReady() ? 0 : wParam);
             break;
         case MSG_KEYDOWN:
+            if (wParam == MMI_KEY_PASS && d->passReady && !d->passReady()) return 0;
             if (wParam == MMI_KEY_PASS) {
                 TW_DEBUG(domain_of(d), "%s pass", __func__);
                 hw_stop(d);

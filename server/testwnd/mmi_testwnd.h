@@ -72,6 +72,9 @@ struct mmi_testwnd_desc {
     // Sees every message first (after MSG_CREATE's own work, before MSG_CLOSE's); non-zero
     // when it handled the message, which the common procedure then leaves alone.
     int (*hook)(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) = nullptr;
+    // When set, the pass label and the pass key wait for it to answer true as well as for
+    // the fool-proof delay (a test that must hear from the hardware first).
+    bool (*passReady)(void) = nullptr;
 };
 
 #define MMI_TESTWND_NOTE_SIZE 1024

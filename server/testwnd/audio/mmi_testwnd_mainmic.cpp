@@ -54,14 +54,14 @@ int hook(HWND hWnd, UINT message, WPARAM wParam, LPARAM) {
             if (s_phase.load() == PHASE_RECORDING)
                 s_phase = play() == 0 ? PHASE_PLAYING : PHASE_FAILED;
             InvalidateRect(hWnd, nullptr, TRUE);
-            if (s_phase.load() == PHASE_PLAYING) return 0;
-            mmi_testwnd_show_keys(hWnd, catalogue::MainMicRecord.titleKey, 0);
-            return 1;
-        case MSG_KEYDOWN:
-            return wParam == MMI_KEY_PASS && s_phase.load() != PHASE_PLAYING;
+            return 0;
         default:
             return 0;
     }
+}
+
+bool playing(void) {
+    return s_phase.load() == PHASE_PLAYING;
 }
 
 const mmi_testwnd_desc kMainMic = {
@@ -74,6 +74,7 @@ const mmi_testwnd_desc kMainMic = {
     .stopEntry = mmi_test_MainMicRecordTest_Stop_Entry,
     .note = note,
     .hook = hook,
+    .passReady = playing,
 };
 
 }  // namespace

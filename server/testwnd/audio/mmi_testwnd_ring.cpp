@@ -59,7 +59,7 @@ void hifi_note(char *out, unsigned int size) {
     mmi_translate(s_hifiHeadset.load() == 1 ? "info_HIFINote" : "info_HeadSetNote", out, size);
 }
 
-int hifi_hook(HWND hWnd, UINT message, WPARAM wParam, LPARAM) {
+int hifi_hook(HWND, UINT message, WPARAM, LPARAM) {
     switch (message) {
         case MSG_CREATE:
             s_hifiHeadset = headset_status();
@@ -67,18 +67,14 @@ int hifi_hook(HWND hWnd, UINT message, WPARAM wParam, LPARAM) {
                 hw::ftx_api_Audio_HiFiTest_Start();
             RING_DEBUG("FTX_HIFI", "%s::headset=%d", __func__, s_hifiHeadset.load());
             return 0;
-        case MSG_TIMER:
-            // Without a headset nothing plays: only the fail key is offered.
-            if (wParam == MMI_TIMER_FOOLPROOF && s_hifiHeadset.load() != 1) {
-                mmi_testwnd_show_keys(hWnd, "title_RingTest", 0);
-                return 1;
-            }
-            return 0;
-        case MSG_KEYDOWN:
-            return wParam == MMI_KEY_PASS && s_hifiHeadset.load() != 1;
         default:
             return 0;
     }
+}
+
+// Without a headset nothing plays: only the fail key is offered.
+bool hifi_ready(void) {
+    return s_hifiHeadset.load() == 1;
 }
 
 int Init_Hifi(void) {
@@ -96,6 +92,7 @@ const mmi_testwnd_desc kHifi = {
     .bind = Init_Hifi,
     .note = hifi_note,
     .hook = hifi_hook,
+    .passReady = hifi_ready,
 };
 
 // The ring type of an item ("RingType", default 0).
