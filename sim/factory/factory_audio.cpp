@@ -19,6 +19,7 @@
 
 #include "devfs.h"
 #include "factory_area.h"
+#include "sim_wav.h"
 
 namespace ftxsim {
 namespace {
@@ -223,12 +224,6 @@ void put32(unsigned char *p, uint32_t v) {
     put16(p, v & 0xffff);
     put16(p + 2, v >> 16);
 }
-unsigned get16(const unsigned char *p) {
-    return p[0] | (p[1] << 8);
-}
-uint32_t get32(const unsigned char *p) {
-    return get16(p) | (static_cast<uint32_t>(get16(p + 2)) << 16);
-}
 
 int write_failed(const char *step, const char *path) {
     __android_log_print(ANDROID_LOG_ERROR, kTag, "cannot write %s: %s: %s", path, step,
@@ -273,58 +268,16 @@ int write_wav(const char *output, const Samples &s) {
     return 0;
 }
 
-// Reads a host WAV file of 16-bit PCM mono at kRate: at most kMaxInput samples, the rest is
-// cut. Returns 0, or -1 with the reason in why.
+// Reads a host WAV file: at most kMaxInput samples, the rest is cut. Returns 0, or -1 with
+// the reason in why.
 int read_wav(const char *path, Samples *out, std::string *why) {
     FILE *f = fopen(path, "rb");
     if (f == nullptr) {
         *why = std::string("cannot open ") + path + ": " + strerror(errno);
         return -1;
     }
-    unsigned char h[16];
-    bool fmt = false;
-    int rc = -1;
-    *why = std::string(path) + " is not a WAV file";
-    if (fread(h, 1, 12, f) == 12 && memcmp(h, "RIFF", 4) == 0 && memcmp(h + 8, "WAVE", 4) == 0) {
-        *why = std::string(path) + " has no data";
-        while (fread(h, 1, 8, f) == 8) {
-            const uint32_t len = get32(h + 4);
-            if (memcmp(h, "fmt ", 4) == 0 && len >= 16 && fread(h, 1, 16, f) == 16) {
-                const unsigned format = get16(h), channels = get16(h + 2), bits = get16(h + 14);
-                const uint32_t rate = get32(h + 4);
-                if (format != 1 || channels != 1 || bits != 16) {
-                    *why = std::string(path) + " is not 16-bit PCM mono (format " +
-                           std::to_string(format) + ", " + std::to_string(channels) +
-                           " channels, " + std::to_string(bits) + " bits)";
-                    break;
-                }
-                if (rate != kRate) {
-                    *why = std::string(path) + " is at " + std::to_string(rate) +
-                           " Hz: only 16000 Hz is taken, nothing is resampled";
-                    break;
-                }
-                fmt = true;
-                if (fseek(f, static_cast<long>(len - 16 + (len & 1)), SEEK_CUR) != 0) break;
-            } else if (memcmp(h, "data", 4) == 0) {
-                if (!fmt) {
-                    *why = std::string(path) + " has its data before its format";
-                    break;
-                }
-                const size_t n = len / 2 < kMaxInput ? len / 2 : kMaxInput;
-                std::vector<unsigned char> bytes(n * 2);
-                const size_t got = fread(bytes.data(), 2, n, f);
-                out->resize(got);
-                for (size_t i = 0; i < got; ++i)
-                    (*out)[i] = static_cast<int16_t>(get16(&bytes[2 * i]));
-                if (got > 0) rc = 0;
-                break;
-            } else if (fseek(f, static_cast<long>(len + (len & 1)), SEEK_CUR) != 0) {
-                break;
-            }
-        }
-    }
+    const int rc = sim_read_wav(f, path, kRate, kMaxInput, out, why);
     fclose(f);
-    if (rc == 0) why->clear();
     return rc;
 }
 
