@@ -23,11 +23,12 @@ function(ftx_add_gtest name)
   gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST)
 endfunction()
 
-# ftx_add_fuzz(NAME SOURCES ... LIBS ...): a libFuzzer target (fuzz builds only).
+# ftx_add_fuzz(NAME SOURCES ... LIBS ... INCLUDES ...): a libFuzzer target (fuzz builds only).
 function(ftx_add_fuzz name)
-  cmake_parse_arguments(A "" "" "SOURCES;LIBS" ${ARGN})
+  cmake_parse_arguments(A "" "" "SOURCES;LIBS;INCLUDES" ${ARGN})
   add_executable(${name} ${A_SOURCES})
   target_link_libraries(${name} PRIVATE ${A_LIBS} Threads::Threads)
+  target_include_directories(${name} PRIVATE ${A_INCLUDES})
   target_link_options(${name} PRIVATE -fsanitize=fuzzer,address,undefined)
   set_target_properties(${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/fuzz)
   set_property(GLOBAL APPEND PROPERTY FTX_FUZZ_TARGETS ${name})

@@ -151,13 +151,15 @@ void mmi_translate(const char *key, char *out, size_t size) {
     Read_LangCfgFromList(key, out);
 }
 
-HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
-    RECT rc;
-    mmi_testwnd_rect(g_ptScreenInfo.width, g_ptScreenInfo.height, &rc);
+namespace {
+
+// A main window hosted by the main window, in rc, on the window background.
+HWND create_main(const char *caption, WNDPROC proc, DWORD addData, DWORD style, DWORD exStyle,
+                 const RECT &rc) {
     MAINWINCREATE create;
     memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_CAPTION | WS_VISIBLE;
-    create.dwExStyle = WS_EX_NONE;
+    create.dwStyle = style;
+    create.dwExStyle = exStyle;
     create.spCaption = caption;
     create.hHosting = mmi_guithread_window();
     create.MainWindowProc = proc;
@@ -173,24 +175,18 @@ HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
     return hWnd;
 }
 
+}  // namespace
+
+HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
+    RECT rc;
+    mmi_testwnd_rect(g_ptScreenInfo.width, g_ptScreenInfo.height, &rc);
+    return create_main(caption, proc, addData, WS_CAPTION | WS_VISIBLE, WS_EX_NONE, rc);
+}
+
 HWND mmi_testwnd_create_full(const char *caption, WNDPROC proc, DWORD addData) {
-    MAINWINCREATE create;
-    memset(&create, 0, sizeof(create));
-    create.dwStyle = WS_VISIBLE;
-    create.dwExStyle = WS_EX_TOPMOST;
-    create.spCaption = caption;
-    create.hHosting = mmi_guithread_window();
-    create.MainWindowProc = proc;
-    create.rx = g_ptScreenInfo.width;
-    create.by = g_ptScreenInfo.height;
-    create.iBkColor = mmi_pixel(MMI_COLOUR_WINDOW);
-    create.dwAddData = addData;
-    HWND hWnd = CreateMainWindow(&create);
-    if (hWnd == HWND_INVALID) {
-        TW_ERROR("FTX_MAIN", "%s CreateMainWindow %s fail", __func__, caption);
-        return hWnd;
-    }
-    ShowWindow(hWnd, SW_SHOWNORMAL);
+    const RECT screen = {0, 0, g_ptScreenInfo.width, g_ptScreenInfo.height};
+    HWND hWnd = create_main(caption, proc, addData, WS_VISIBLE, WS_EX_TOPMOST, screen);
+    if (hWnd != HWND_INVALID) ShowWindow(hWnd, SW_SHOWNORMAL);
     return hWnd;
 }
 

@@ -6,6 +6,7 @@
 
 #include "adbd_connection/handlers/common.h"
 #include "adbd_connection/handlers/handlers.h"
+#include "core/mmi_loglevel.h"
 #include "testwnd/audio/mmi_testwnd_fm.h"
 #include "testwnd/audio/mmi_testwnd_loopback.h"
 #include "testwnd/audio/mmi_testwnd_mainmic.h"
@@ -50,8 +51,7 @@ const int kLoopCount = (int)(sizeof(kLoops) / sizeof(kLoops[0]));
 int s_audioLoop = -1;
 
 void log_parm(const char *name, const char *parm) {
-    __android_log_print(ANDROID_LOG_DEBUG, AT_TAG, "%s begin,bufIn=%s", name,
-                        parm != nullptr ? parm : "");
+    MMI_LOGD(AT_TAG, "%s begin,bufIn=%s", name, parm != nullptr ? parm : "");
 }
 
 int start_loop(const char *name, int loop, const char *parm, int parmLen) {

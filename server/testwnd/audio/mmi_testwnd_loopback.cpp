@@ -41,29 +41,29 @@ struct Member {
     const mmi_catalogue_row *row;
     const char *caption;
     const char *titleKey;
-    const char *noteKey;  // the note before a headset is seen, and of loops without one
     unsigned mic, out;
-    bool headset;         // the pass key waits for a headset with microphone
-    const char *volName;  // names the loop in the volume-key log lines
+    bool headset;            // the pass key waits for a headset with microphone
+    const char *volName;     // names the loop in the volume-key log lines
+    int (*stopEntry)(void);  // the operator's stop
 };
 
 const Member kMembers[LB_COUNT] = {
-    {&catalogue::AudioMicHeadsetLoopback, "", "menu_Mic_Headset", "info_HeadSetNote", MIC_MAIN,
-     OUT_HEADSET, true, "mainmic-headset"},
-    {&catalogue::AudioAuxMic1HeadsetLoopback, "", "menu_AuxMic1_Headset", "info_HeadSetNote",
-     MIC_AUX1, OUT_HEADSET, true, "auxmic1-headset"},
-    {&catalogue::AudioAuxMic2HeadsetLoopback, "", "menu_AuxMic2_Headset", "info_HeadSetNote",
-     MIC_AUX2, OUT_HEADSET, true, "auxmic2-headset"},
-    {&catalogue::AudioHeadsetReceiverLoopback, "", "menu_Headset_Receiver", "info_HeadSetNote",
-     MIC_HEADSET, OUT_RECEIVER, true, "headsetmic-receiver"},
-    {&catalogue::AudioHeadsetSpeakerLoopback, "", "title_Headset_Speaker", "info_HeadSetNote",
-     MIC_HEADSET, OUT_SPEAKER, true, "headsetmic-speaker"},
-    {&catalogue::HeadsetLoopback, "", "menu_HeadSetTest", "info_HeadSetNote", MIC_HEADSET,
-     OUT_HEADSET, true, "headsetmic-headset"},
-    {&catalogue::AudioLoopback, "CAMERA WIN", "title_LoopBackTest", "info_LoopBackNote", MIC_MAIN,
-     OUT_RECEIVER, false, "mainmic-receiver"},
-    {&catalogue::AudioLoopback, "Speaker", "title_LoopBackTest", "info_LoopBackNote", MIC_MAIN,
-     OUT_UPSPEAKER, false, "mainmic-speakers"},
+    {&catalogue::AudioMicHeadsetLoopback, "", "menu_Mic_Headset", MIC_MAIN, OUT_HEADSET, true,
+     "mainmic-headset", mmi_testwnd_Audio_MIC_Headset_Stop_Entry},
+    {&catalogue::AudioAuxMic1HeadsetLoopback, "", "menu_AuxMic1_Headset", MIC_AUX1, OUT_HEADSET,
+     true, "auxmic1-headset", mmi_testwnd_Audio_AuxiliaryMIC1_Headset_Stop_Entry},
+    {&catalogue::AudioAuxMic2HeadsetLoopback, "", "menu_AuxMic2_Headset", MIC_AUX2, OUT_HEADSET,
+     true, "auxmic2-headset", mmi_testwnd_Audio_AuxiliaryMIC2_Headset_Stop_Entry},
+    {&catalogue::AudioHeadsetReceiverLoopback, "", "menu_Headset_Receiver", MIC_HEADSET,
+     OUT_RECEIVER, true, "headsetmic-receiver", mmi_testwnd_Audio_Headset_Receiver_Stop_Entry},
+    {&catalogue::AudioHeadsetSpeakerLoopback, "", "title_Headset_Speaker", MIC_HEADSET, OUT_SPEAKER,
+     true, "headsetmic-speaker", mmi_testwnd_Audio_Headset_Speaker_Stop_Entry},
+    {&catalogue::HeadsetLoopback, "", "menu_HeadSetTest", MIC_HEADSET, OUT_HEADSET, true,
+     "headsetmic-headset", mmi_testwnd_HANDSET_MIC_Stop_Entry},
+    {&catalogue::AudioLoopback, "CAMERA WIN", "title_LoopBackTest", MIC_MAIN, OUT_RECEIVER, false,
+     "mainmic-receiver", mmi_testwnd_AudioLoopBackTest_Stop_Entry},
+    {&catalogue::AudioLoopback, "Speaker", "title_LoopBackTest", MIC_MAIN, OUT_UPSPEAKER, false,
+     "mainmic-speakers", mmi_testwnd_AudioLoopBackTest_Stop_Entry},
 };
 
 // A member's run: its window, the headset the library reported, its route.
@@ -163,7 +163,8 @@ void paint(HWND hWnd, int id) {
     const int w = g_ptScreenInfo.width, h = g_ptScreenInfo.height;
     HDC hdc = BeginPaint(hWnd);
     mmi_testwnd_draw_top_line(hdc);
-    const char *noteKey = m.noteKey;
+    // The note before a headset is seen, and of the loops without one.
+    const char *noteKey = m.headset ? "info_HeadSetNote" : "info_LoopBackNote";
     int colour = MMI_COLOUR_TEXT;
     if (m.headset && r.arrived.load()) {
         const int s = r.status.load();
@@ -293,14 +294,7 @@ void *open_member(int id) {
         return HWND_INVALID;
     }
     HWND hWnd = mmi_testwnd_create(kMembers[id].caption, loopback_proc, (DWORD)id);
-    int (*stops[LB_COUNT])(void) = {
-#define MMI_LOOPBACK_STOP(id, entry, stop, ...) stop,
-        MMI_LOOPBACK_MEMBERS(MMI_LOOPBACK_STOP)
-#undef MMI_LOOPBACK_STOP
-            mmi_testwnd_AudioLoopBackTest_Stop_Entry,
-        mmi_testwnd_AudioLoopBackTest_Stop_Entry,
-    };
-    return mmi_ownwnd_opened(&s_run[id].wnd, hWnd, stops[id]);
+    return mmi_ownwnd_opened(&s_run[id].wnd, hWnd, kMembers[id].stopEntry);
 }
 
 void *open_operator(int id) {

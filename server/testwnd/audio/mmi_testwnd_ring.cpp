@@ -77,10 +77,6 @@ bool hifi_ready(void) {
     return s_hifiHeadset.load() == 1;
 }
 
-int Init_Hifi(void) {
-    return Init_Hifi_Interface();
-}
-
 const mmi_testwnd_desc kHifi = {
     .row = &catalogue::Hifi,
     .caption = "CAMERA WIN",
@@ -89,7 +85,7 @@ const mmi_testwnd_desc kHifi = {
     .stopEntrySleepMs = 100,
     .state = &s_hifi,
     .stopEntry = mmi_test_HiFiTest_Stop_Entry,
-    .bind = Init_Hifi,
+    .bind = Init_Hifi_Interface,
     .note = hifi_note,
     .hook = hifi_hook,
     .passReady = hifi_ready,

@@ -69,10 +69,6 @@ bool passed(void) {
     return s_result.load() == PASSED;
 }
 
-int bind(void) {
-    return Init_lib_SmartPACAL_Interface();
-}
-
 const mmi_testwnd_desc kSmartPa = {
     .row = &catalogue::SmartPaCal,
     .caption = "SmartPA Calibration",
@@ -81,7 +77,7 @@ const mmi_testwnd_desc kSmartPa = {
     .stopEntrySleepMs = 100,
     .state = &s_state,
     .stopEntry = mmi_testwnd_SmartPACal_Stop_Entry,
-    .bind = bind,
+    .bind = Init_lib_SmartPACAL_Interface,
     .note = note,
     .hook = hook,
     .passReady = passed,
@@ -111,7 +107,7 @@ int mmi_testwnd_SmartPACal_Stop_Entry(void) {
 
 int mmi_AutoTest_SmartPACalEntry(void) {
     Check_AllTestWnd_Closed();
-    if (bind() != 0) return 0;
+    if (Init_lib_SmartPACAL_Interface() != 0) return 0;
     if (start() != 0) {
         PA_ERROR("%s::ftx_api_SmartPACalibrate_Start fail", __func__);
         return 0;

@@ -124,7 +124,9 @@ void draw_area(HDC hdc, int top, int height, int background, const char *text, i
     SetBrushColor(hdc, mmi_pixel(background));
     FillBox(hdc, 0, top, w, height);
     SetTextColor(hdc, mmi_pixel(colour));
-    RECT rc = {0, top, w, top + height};
+    // A margin on both sides: a long text wraps rather than touching the screen's edge.
+    const int margin = w / 40;
+    RECT rc = {margin, top, w - margin, top + height};
     DrawText(hdc, text, -1, &rc, format);
 }
 
