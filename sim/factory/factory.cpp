@@ -32,10 +32,28 @@ int identity(const char *op, const char *key, const char *def, char *buf, int si
 
 // A start operation that reports through a callback: remembered for "hw send", and its
 // automatic reply (if any) is delivered from the worker thread.
-int start_cb(const char *op, ftx_api_module_cb cb, const char *extra = "") {
-    int rc = call(op, 0, "cb=%p%s", reinterpret_cast<void *>(cb), extra);
+int start_cb(const char *op, ftx_api_module_cb cb, const char *extra = "", int def = 0) {
+    int rc = call(op, def, "cb=%p%s", reinterpret_cast<void *>(cb), extra);
     model().remember(op, cb);
     if (rc == 0) model().auto_reply(op);
+    return rc;
+}
+
+// A start or stop of a test the sensor area reports to by itself. The model listens before
+// the start's report is posted, so that no change falls between them. A forced answer of
+// non-zero starts and ends nothing.
+int listen(const char *op, ftx_api_module_cb cb) {
+    int rc = call(op, 0, "cb=%p", reinterpret_cast<void *>(cb));
+    model().remember(op, cb);
+    if (rc == 0) {
+        model().sensor_listen(op, cb);
+        model().auto_reply(op);
+    }
+    return rc;
+}
+int unlisten(const char *op) {
+    int rc = call(op, 0);
+    if (rc == 0) model().sensor_listen(op, nullptr);
     return rc;
 }
 
@@ -59,6 +77,14 @@ int sound(const char *op, int rc, int arg = 0, int out = 0) {
 #define SIM_INT(name, arg)                      \
     extern "C" int name(int arg) {              \
         return call(#name, 0, #arg "=%d", arg); \
+    }
+#define SIM_LISTEN(name)                        \
+    extern "C" int name(ftx_api_module_cb cb) { \
+        return listen(#name, cb);               \
+    }
+#define SIM_UNLISTEN(name)      \
+    extern "C" int name(void) { \
+        return unlisten(#name); \
     }
 #define SIM_AUDIO(name)                                                      \
     extern "C" int name(void) {                                              \
@@ -169,9 +195,18 @@ SIM_INT(ftx_api_Vibrator_Test_Start, ms)
 SIM_PLAIN(ftx_api_Vibrator_Test_Stop)
 SIM_CB(ftx_api_AllCard_Test_Start)
 SIM_PLAIN(ftx_api_AllCard_Test_Stop)
-SIM_CB(ftx_api_Sensors_Test_Start)
-SIM_PLAIN(ftx_api_Sensors_Test_Stop)
-SIM_INT(ftx_api_Sensors_Calibration, sensor)
+SIM_LISTEN(ftx_api_Sensors_Test_Start)
+SIM_UNLISTEN(ftx_api_Sensors_Test_Stop)
+extern "C" int ftx_api_Sensors_Calibration(int sensor, char *offsets, int size) {
+    int rc = call("ftx_api_Sensors_Calibration", model().sensor_answer(sensor), "sensor=%d,size=%d",
+                  sensor, size);
+    if (rc == 0) {
+        model().calibrate_sensor(sensor, offsets, size > 0 ? static_cast<size_t>(size) : 0);
+    } else if (offsets != nullptr && size > 0) {
+        offsets[0] = '\0';  // a failure changes no offsets
+    }
+    return rc;
+}
 SIM_AUDIO_INT(ftx_api_Audio_RingTest_Start, ring_type)
 SIM_AUDIO_INT(ftx_api_Audio_RingTest_Stop, arg)
 SIM_AUDIO(ftx_api_Audio_HiFiTest_Start)
@@ -265,22 +300,23 @@ extern "C" int ftx_api_Set_LCDBacklight(unsigned int level) {
     if (rc == 0) model().set_backlight(level);
     return rc;
 }
-SIM_CB(ftx_api_HallSensorTest_Start)
-SIM_PLAIN(ftx_api_HallSensorTest_Stop)
-SIM_CB(ftx_api_Hall_2nd_test_start)
-SIM_PLAIN(ftx_api_Hall_2nd_test_Stop)
+SIM_LISTEN(ftx_api_HallSensorTest_Start)
+SIM_UNLISTEN(ftx_api_HallSensorTest_Stop)
+SIM_LISTEN(ftx_api_Hall_2nd_test_start)
+SIM_UNLISTEN(ftx_api_Hall_2nd_test_Stop)
 SIM_PLAIN(ftx_api_Hall_2nd_calibrate)
-SIM_CB(ftx_api_force_touch_sensor_test_start)
-SIM_PLAIN(ftx_api_force_touch_sensor_test_stop)
+SIM_LISTEN(ftx_api_force_touch_sensor_test_start)
+SIM_UNLISTEN(ftx_api_force_touch_sensor_test_stop)
 extern "C" int ftx_api_force_touch_sensor_button_down(void) {
-    return call("ftx_api_force_touch_sensor_button_down", 300);
+    return call("ftx_api_force_touch_sensor_button_down", model().force());
 }
 extern "C" int ftx_api_force_touch_sensor_button_up(void) {
     return call("ftx_api_force_touch_sensor_button_up", 0);
 }
 extern "C" int ftx_api_force_touch_calibration_start(const char *parm, ftx_api_module_cb cb) {
     std::string extra = std::string(",") + (parm != nullptr ? parm : "");
-    return start_cb("ftx_api_force_touch_calibration_start", cb, extra.c_str());
+    return start_cb("ftx_api_force_touch_calibration_start", cb, extra.c_str(),
+                    model().force_weight(parm));
 }
 SIM_PLAIN(ftx_api_force_touch_calibration_stop)
 SIM_CB(ftx_api_force_touch_comprehension_start)
@@ -297,8 +333,8 @@ extern "C" int ftx_api_SDCard_Test_Start(int slot) {
 SIM_PLAIN(ftx_api_SDCard_Test_Stop)
 SIM_CB(ftx_api_NFC_Start)
 SIM_PLAIN(ftx_api_NFC_Stop)
-SIM_CB(ftx_api_sar_start)
-SIM_PLAIN(ftx_api_sar_stop)
+SIM_LISTEN(ftx_api_sar_start)
+SIM_UNLISTEN(ftx_api_sar_stop)
 SIM_CB(ftx_api_SmartPACalibrate_Start)
 SIM_PLAIN(ftx_api_SmartPACalibrate_Stop)
 extern "C" int ftx_api_Get_HeadSetStatus(void) {

@@ -19,6 +19,7 @@ struct Event {
     int datatype;
     std::string text;
     bool none = false;  // send nothing
+    int delayMs = 100;  // after the start, scaled by FTX_TIME_SCALE
 };
 
 // The event that sends nothing.
@@ -37,6 +38,9 @@ Part &model_part() {
 
 // The library's callback thread.
 Worker &worker();
+
+// Calls cb with one event now (the worker's part of deliver()).
+void call_back(ftx_api_module_cb cb, int datatype, const std::string &text, bool withText);
 
 // Delivers one event to cb on the worker thread.
 void deliver(ftx_api_module_cb cb, int datatype, const std::string &text, bool withText,

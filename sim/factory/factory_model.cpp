@@ -122,8 +122,8 @@ constinit const Area kCoreArea = {
 };
 
 // Every area, in the order "hw help" lists their words. An operation's automatic reply is
-// the first an area gives, in the same order: the areas without words stand first so that
-// the force-touch names are matched before any name holding "Loopback".
+// the first an area gives, in the same order: the sensor area stands first so that the
+// force-touch names are matched before any name holding "Loopback".
 const Area *const kAreas[] = {
     &kSensorsArea, &kPcbaArea,  &kAudioArea, &kTouchArea,    &kInfoArea,    &kCameraArea,
     &kCardsArea,   &kRadioArea, &kCoreArea,  &kFirmwareArea, &kDisplayArea,
@@ -150,6 +150,8 @@ void print_state(Reply &r) {
     kCameraArea.state(r);
     r.add("\ndisplay:");
     kDisplayArea.state(r);
+    r.add("\nsensors:");
+    kSensorsArea.state(r);
     r.add("\n");
 }
 
@@ -192,16 +194,17 @@ Worker &worker() {
 void deliver(ftx_api_module_cb cb, int datatype, const std::string &text, bool withText,
              int delay_ms) {
     if (cb == nullptr) return;
-    worker().post(
-        [cb, datatype, text, withText] {
-            std::string copy = text;
-            module_data d;
-            d.totallen = withText ? static_cast<unsigned int>(copy.size()) : 0;
-            d.datatype = datatype;
-            d.data = withText ? copy.data() : nullptr;
-            cb(&d);
-        },
-        delay_ms);
+    worker().post([cb, datatype, text, withText] { call_back(cb, datatype, text, withText); },
+                  delay_ms);
+}
+
+void call_back(ftx_api_module_cb cb, int datatype, const std::string &text, bool withText) {
+    std::string copy = text;
+    module_data d;
+    d.totallen = withText ? static_cast<unsigned int>(copy.size()) : 0;
+    d.datatype = datatype;
+    d.data = withText ? copy.data() : nullptr;
+    cb(&d);
 }
 
 ftx_api_module_cb callback_of(const std::string &op) {
@@ -250,7 +253,7 @@ void FactoryModel::auto_reply(const char *op) {
     }
     if (!overridden) e = default_reply(op);  // outside the lock: it reads device.ini
     if (e.none) return;
-    deliver(callback_of(op), e.datatype, e.text, !e.text.empty(), 100);
+    deliver(callback_of(op), e.datatype, e.text, !e.text.empty(), e.delayMs);
 }
 
 FactoryModel &model() {

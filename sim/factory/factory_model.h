@@ -43,6 +43,19 @@ class FactoryModel {
     // power.
     void set_backlight(unsigned level);
     void set_lcd(bool on);
+    // The sensor area's reports: a start of the sensor, Hall, SAR or force-touch test makes
+    // the model report to cb (the sensor test also every 200 ms, scaled) until its stop; any
+    // other op changes nothing.
+    void sensor_listen(const char *op, ftx_api_module_cb cb);
+    // The model's answer to a sensor calibration: 0 for a sensor number FTX_SENSOR_..., else -1.
+    int sensor_answer(int sensor);
+    // Calibrates sensor and writes its new offsets ("x,y,z" or one value) into offsets.
+    void calibrate_sensor(int sensor, char *offsets, size_t size);
+    // The force pressed on the force-touch sensor, in grams.
+    int force();
+    // A force-touch calibration's weight parameter (grams; null or empty: 500): 0 for a
+    // positive whole number, which becomes the weight, else -1.
+    int force_weight(const char *parm);
 };
 
 FactoryModel &model();

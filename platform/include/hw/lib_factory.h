@@ -49,17 +49,33 @@ typedef void (*ftx_api_hookkey_cb)(unsigned int *status);
 #define FTX_DATATYPE_PCBA_SIM 121       /* SIM cards present */
 #define FTX_DATATYPE_PCBA_TOUCH 122     /* touch points seen */
 /* Other tests: text "key=value;key=value..." (see docs/hardware.md). */
-#define FTX_DATATYPE_SENSOR 130      /* acc=x,y,z;mag=...;gyro=...;pressure=..;proxi=..;light=.. */
+/* acc=X,Y,Z;mag=X,Y,Z;gyro=X,Y,Z;pressure=P;proxi=D;light=L;hr=B;hrself=1|0
+ * (m/s2, uT, rad/s, hPa, cm with 0 near, lux, beats a minute; hrself: the heart-rate
+ * sensor's self test passed) */
+#define FTX_DATATYPE_SENSOR 130
 #define FTX_DATATYPE_HALL 131        /* state=near|far */
 #define FTX_DATATYPE_FINGERPRINT 132 /* result=pass|fail */
 #define FTX_DATATYPE_NFC 133         /* result=pass|fail */
-#define FTX_DATATYPE_SAR 134         /* value=N */
+#define FTX_DATATYPE_SAR 134         /* value=N;aux=M (main and auxiliary SAR readings) */
 #define FTX_DATATYPE_SMARTPA 135     /* result=pass|fail;value=N */
 #define FTX_DATATYPE_OTG 136         /* result=pass|fail */
-#define FTX_DATATYPE_FORCETOUCH 137  /* value=N */
+/* value=N (grams pressed), or result=pass|fail;value=N from a calibration or the
+ * comprehensive test */
+#define FTX_DATATYPE_FORCETOUCH 137
 #define FTX_DATATYPE_LOOPBACK 138    /* result=pass|fail (acoustic loopback, wake-up mic) */
 /* Touch self-test verdicts arrive as the datatype itself (0 pass, -1, -2, -4, or a bit set of
  * failures); a verdict with failures may carry "x,y,num,px,py,..." raw failure data. */
+
+/* Sensor numbers of ftx_api_Sensors_Calibration. */
+#define FTX_SENSOR_ACC 1
+#define FTX_SENSOR_MAG 2
+#define FTX_SENSOR_GYRO 3
+#define FTX_SENSOR_PRESSURE 4
+#define FTX_SENSOR_PROXI 5
+#define FTX_SENSOR_LIGHT 6
+#define FTX_SENSOR_HEARTRATE 7
+/* Size of the offsets text of a calibration. */
+#define FTX_SENSOR_OFFSETS_SIZE 64
 
 /* Camera numbers. */
 #define FTX_CAMERA_BACK 0
@@ -105,9 +121,14 @@ int ftx_api_Vibrator_Test_Start(int ms);
 int ftx_api_Vibrator_Test_Stop(void);
 int ftx_api_AllCard_Test_Start(ftx_api_module_cb cb);
 int ftx_api_AllCard_Test_Stop(void);
+/* Reports every sensor through cb (FTX_DATATYPE_SENSOR) at the start, then periodically
+ * and whenever a value changes, until stopped. */
 int ftx_api_Sensors_Test_Start(ftx_api_module_cb cb);
 int ftx_api_Sensors_Test_Stop(void);
-int ftx_api_Sensors_Calibration(int sensor);
+/* Calibrates sensor (FTX_SENSOR_...): writes its new offsets, "x,y,z" or one value, into
+ * offsets (size bytes, NUL-terminated); later reports carry values with the offsets
+ * applied. -1 for an unknown sensor. */
+int ftx_api_Sensors_Calibration(int sensor, char *offsets, int size);
 int ftx_api_Audio_RingTest_Start(int ring_type);
 int ftx_api_Audio_RingTest_Stop(int arg);
 int ftx_api_Audio_HiFiTest_Start(void);
@@ -164,18 +185,22 @@ int ftx_api_KeyBacklightTest_Stop(void);
 int ftx_api_LEDColorTest_Start(const char *color);
 int ftx_api_LEDColorTest_Stop(void);
 int ftx_api_Set_LCDBacklight(unsigned int level);
+/* Hall and SAR starts report the state at once and then each change. */
 int ftx_api_HallSensorTest_Start(ftx_api_module_cb cb);
 int ftx_api_HallSensorTest_Stop(void);
 int ftx_api_Hall_2nd_test_start(ftx_api_module_cb cb);
 int ftx_api_Hall_2nd_test_Stop(void);
 int ftx_api_Hall_2nd_calibrate(void);
+/* Reports the force at once and then each change. */
 int ftx_api_force_touch_sensor_test_start(ftx_api_module_cb cb);
 int ftx_api_force_touch_sensor_test_stop(void);
 /* Return the force value read at the press / release. */
 int ftx_api_force_touch_sensor_button_down(void);
 int ftx_api_force_touch_sensor_button_up(void);
+/* parm: the calibration weight in grams (empty: 500). One result event follows. */
 int ftx_api_force_touch_calibration_start(const char *parm, ftx_api_module_cb cb);
 int ftx_api_force_touch_calibration_stop(void);
+/* One result event follows. */
 int ftx_api_force_touch_comprehension_start(ftx_api_module_cb cb);
 int ftx_api_force_touch_comprehension_stop(void);
 int ftx_api_FingerPrintTest_Start(ftx_api_module_cb cb);

@@ -13,7 +13,7 @@
 #include "testwnd/audio/mmi_testwnd_ring.h"
 #include "testwnd/display/mmi_testwnd_auxlcdhint.h"
 #include "testwnd/display/mmi_testwnd_lcd.h"
-#include "pending/sensors.h"
+#include "testwnd/sensors/mmi_testwnd_sar.h"
 #include "testwnd/catalogue.h"
 
 namespace {

@@ -1,0 +1,401 @@
+// The shared sensor window.
+#include "testwnd/sensors/mmi_sensor_window.h"
+
+#include <stdio.h>
+#include <stdlib.h>
+#include <string.h>
+
+#include <android/log.h>
+
+#include "core/ftx_config.h"
+#include "mmi_guithread.h"
+#include "mmi_theme.h"
+#include "tp_os.h"
+
+#define SW_DEBUG(d, ...) __android_log_print(ANDROID_LOG_DEBUG, (d)->row->domain, __VA_ARGS__)
+#define SW_ERROR(d, ...) __android_log_print(ANDROID_LOG_ERROR, (d)->row->domain, __VA_ARGS__)
+
+namespace {
+
+constexpr int kParamsMax = 24;
+
+const mmi_sensorwnd_desc *desc_of(HWND hWnd) {
+    return reinterpret_cast<const mmi_sensorwnd_desc *>(GetWindowAdditionalData(hWnd));
+}
+
+// The item's parameter records: its catalogue row's, else its configuration domain's (a
+// family the catalogue does not list).
+int read_params(const mmi_sensorwnd_desc *d, ftx_config_para *p) {
+    int n = mmi_testwnd_params(d->row->domain, p, kParamsMax);
+    if (n > 0) return n;
+    char text[FTX_CFG_TEXT_SIZE] = {0};
+    if (Read_MainCfgFile(d->row->domain, "parameter", text, "") != 0) return 0;
+    return ftx_config_parse_parameter(text, p, kParamsMax);
+}
+
+double param_double(const ftx_config_para *p, int n, const char *key, double def) {
+    if (key == nullptr) return def;
+    char value[FTX_CFG_TEXT_SIZE] = {0};
+    ftx_config_get_para_value(p, n, key, value, sizeof(value), "");
+    char *end = nullptr;
+    const double v = strtod(value, &end);
+    return end != value ? v : def;
+}
+
+// The configured lines, with their limits; how many.
+int setup_lines(const mmi_sensorwnd_desc *d) {
+    ftx_config_para p[kParamsMax];
+    const int n = read_params(d, p);
+    mmi_sensorwnd_state *st = d->state;
+    st->lineCount = 0;
+    for (int i = 0; i < d->lineCount && st->lineCount < MMI_SENSOR_LINES_MAX; i++) {
+        const mmi_sensor_line_spec *s = &d->lines[i];
+        if (s->enableParam != nullptr &&
+            param_double(p, n, s->enableParam, s->offByDefault ? 0 : 1) == 0)
+            continue;
+        const double lo = param_double(p, n, s->loParam, s->loDef);
+        const double hi = param_double(p, n, s->hiParam, s->hiDef);
+        mmi_sensor_line_reset(&st->lines[st->lineCount++], s, lo, hi);
+        SW_DEBUG(d, "%s::%s lo=%g hi=%g", __func__, s->key, lo, hi);
+    }
+    st->passOffered = 0;
+    return st->lineCount;
+}
+
+void lib_start(const mmi_sensorwnd_desc *d) {
+    {
+        std::lock_guard<std::mutex> lk(d->state->lock);
+        d->state->taken = d->state->reports;  // the lines start from the library's start
+    }
+    const int rc = d->start ? d->start(d->callback) : -1;
+    SW_DEBUG(d, "%s rc=%d", __func__, rc);
+    if (rc == 0) d->state->running = 1;
+}
+
+void lib_stop(const mmi_sensorwnd_desc *d) {
+    if (!d->state->running.exchange(0)) return;
+    if (d->stop) d->stop();
+    SW_DEBUG(d, "%s", __func__);
+}
+
+void soft_keys(HWND hWnd, const mmi_sensorwnd_desc *d, const char *titleKey) {
+    char pass[MMI_TESTWND_TEXT_SIZE], fail[MMI_TESTWND_TEXT_SIZE];
+    mmi_translate("Result_pass", pass, sizeof(pass));
+    mmi_translate("Result_fail", fail, sizeof(fail));
+    mmi_testwnd_set_bars(hWnd, titleKey, d->state->passOffered ? pass : "", "", fail);
+}
+
+void pass_and_close(HWND hWnd, const mmi_sensorwnd_desc *d) {
+    SW_DEBUG(d, "%s", __func__);
+    lib_stop(d);
+    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    mmi_testwnd_record_pass(d->row->resultIndex, d->row->domain);
+}
+
+void fail_and_close(HWND hWnd, const mmi_sensorwnd_desc *d) {
+    SW_DEBUG(d, "%s", __func__);
+    lib_stop(d);
+    mmi_testwnd_record_fail(d->row->resultIndex);
+    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+}
+
+// The last report, parsed; call with the lock held and at least one report.
+void parse_last(mmi_sensorwnd_state *st, mmi_sensor_report *out) {
+    const char *text = st->queue[(st->reports - 1) % MMI_SENSOR_QUEUE];
+    mmi_sensor_parse(text, MMI_SENSOR_REPORT_SIZE, out);
+}
+
+// Every report not yet taken through the lines (the oldest ones are lost when more came
+// than the queue holds); every line passed offers pass (or passes).
+void take_reports(HWND hWnd, const mmi_sensorwnd_desc *d) {
+    mmi_sensorwnd_state *st = d->state;
+    mmi_sensor_report r[MMI_SENSOR_QUEUE];
+    int n = 0;
+    {
+        std::lock_guard<std::mutex> lk(st->lock);
+        unsigned from = st->taken;
+        if (st->reports - from > MMI_SENSOR_QUEUE) from = st->reports - MMI_SENSOR_QUEUE;
+        for (unsigned i = from; i != st->reports; i++)
+            mmi_sensor_parse(st->queue[i % MMI_SENSOR_QUEUE], MMI_SENSOR_REPORT_SIZE, &r[n++]);
+        st->taken = st->reports;
+    }
+    for (int k = 0; k < n; k++) {
+        for (int i = 0; i < st->lineCount; i++) {
+            const int was = st->lines[i].done;
+            if (mmi_sensor_line_update(&st->lines[i], &r[k]) && !was)
+                SW_DEBUG(d, "sensor %s passed", st->lines[i].spec->key);
+        }
+    }
+    if (n == 0) return;
+    InvalidateRect(hWnd, nullptr, TRUE);
+    if (st->passOffered || !mmi_sensor_lines_done(st->lines, st->lineCount)) return;
+    st->passOffered = 1;
+    SW_DEBUG(d, "every sensor passed");
+    if (d->autoPass && !st->wnd.pcDriven.load()) {
+        pass_and_close(hWnd, d);
+        return;
+    }
+    soft_keys(hWnd, d, nullptr);
+}
+
+bool has_sides(const mmi_sensor_line_spec *s) {
+    return (s->kind == MMI_SENSOR_BOTH_SIDES || s->kind == MMI_SENSOR_COME_GO) &&
+           s->lowWordKey != nullptr;
+}
+
+// A line's side words ("near", "far"), each green once seen.
+void draw_sides(HDC hdc, const mmi_sensor_line &l, int x, int top, int bottom, int right) {
+    const mmi_sensor_line_spec *s = l.spec;
+    if (!has_sides(s)) return;
+    const char *keys[2] = {s->lowWordKey, s->highWordKey};
+    const int seen[2] = {l.low, l.high};
+    const int half = (right - x) / 2;
+    for (int k = 0; k < 2; k++) {
+        char word[MMI_TESTWND_TEXT_SIZE];
+        mmi_translate(keys[k], word, sizeof(word));
+        SetTextColor(hdc, mmi_pixel(seen[k] ? MMI_COLOUR_PASS : MMI_COLOUR_GRAY));
+        RECT rc = {x + k * half, top, x + (k + 1) * half, bottom};
+        DrawText(hdc, word, -1, &rc, DT_CENTER | DT_VCENTER | DT_SINGLELINE);
+    }
+}
+
+// The value a RESULT line shows: its pass or fail word and its extra value.
+void result_text(const mmi_sensor_line &l, char *out, size_t size) {
+    char word[MMI_TESTWND_TEXT_SIZE] = "";
+    const char *key = l.v[0] == 1 ? l.spec->highWordKey : l.spec->lowWordKey;
+    if (key != nullptr) mmi_translate(key, word, sizeof(word));
+    if (l.hasExtra) {
+        snprintf(out, size, "%s  %.*f %s", word, l.spec->decimals, l.extra, l.spec->unit);
+    } else {
+        snprintf(out, size, "%s", word);
+    }
+}
+
+void paint(HWND hWnd, const mmi_sensorwnd_desc *d) {
+    mmi_sensorwnd_state *st = d->state;
+    const int w = g_ptScreenInfo.width;
+    const int font = mmi_logfont_size(3, w);
+    HDC hdc = BeginPaint(hWnd);
+    mmi_testwnd_draw_top_line(hdc);
+    SetBkMode(hdc, BM_TRANSPARENT);
+    char text[MMI_TESTWND_NOTE_SIZE];
+    mmi_translate(d->noteKey, text, sizeof(text));
+    SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
+    const int noteTop = w / 15 + 10;
+    RECT note = {w / 16, noteTop, w - w / 16, noteTop};
+    DrawText(hdc, text, -1, &note, DT_WORDBREAK | DT_CALCRECT);  // as many lines as it takes
+    note.right = w - w / 16;
+    DrawText(hdc, text, -1, &note, DT_WORDBREAK);
+    const int rowH = font * 2;
+    int top = note.bottom + font / 2;
+    SetPenColor(hdc, mmi_pixel(MMI_COLOUR_FRAME));
+    SetPenWidth(hdc, 1);
+    for (int i = 0; i < st->lineCount; i++, top += rowH) {
+        const mmi_sensor_line &l = st->lines[i];
+        MoveTo(hdc, 0, top);
+        LineTo(hdc, w, top);
+        SetTextColor(hdc, mmi_pixel(l.done ? MMI_COLOUR_PASS : MMI_COLOUR_FAIL));
+        mmi_translate(l.spec->labelKey, text, sizeof(text));
+        RECT label = {w / 16, top, w * 3 / 8, top + rowH};
+        DrawText(hdc, text, -1, &label, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+        if (l.spec->kind == MMI_SENSOR_RESULT) {
+            if (l.seen)
+                result_text(l, text, sizeof(text));
+            else
+                text[0] = 0;
+        } else if (l.word[0] != 0) {
+            char key[MMI_SENSOR_WORD_SIZE + 8];
+            snprintf(key, sizeof(key), "sensor_%s", l.word);
+            mmi_translate(key, text, sizeof(text));
+        } else {
+            mmi_sensor_line_value(&l, text, sizeof(text));
+        }
+        const bool sides = has_sides(l.spec);
+        RECT value = {w * 3 / 8 + w / 48, top, sides ? w * 11 / 16 : w - w / 32, top + rowH};
+        DrawText(hdc, text, -1, &value, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+        // The side words in the smaller font: two share what is left of the line.
+        PLOGFONT lineFont = GetCurFont(hdc);
+        if (g_mmiLogFont[4]) SelectFont(hdc, g_mmiLogFont[4]);
+        draw_sides(hdc, l, w * 11 / 16, top, top + rowH, w - w / 32);
+        if (lineFont) SelectFont(hdc, lineFont);
+    }
+    MoveTo(hdc, 0, top);
+    LineTo(hdc, w, top);
+    EndPaint(hWnd, hdc);
+}
+
+LRESULT sensor_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
+    const mmi_sensorwnd_desc *d = desc_of(hWnd);
+    if (message == MSG_CREATE)
+        d = reinterpret_cast<const mmi_sensorwnd_desc *>(
+            reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
+    if (d == nullptr) return DefaultMainWinProc(hWnd, message, wParam, lParam);
+    mmi_sensorwnd_state *st = d->state;
+    const char *tag = d->row->domain;
+    switch (message) {
+        case MSG_CREATE:
+            mmi_testwnd_create_title(hWnd, d->row->titleKey);
+            mmi_set_current_test(tag);
+            // The library may report as soon as it starts: the window is known by then.
+            st->wnd.hwnd = hWnd;
+            st->wnd.created = 1;
+            lib_start(d);
+            break;
+        case MSG_ACTIVE:
+            if (mmi_ownwnd_refuses(&st->wnd, message, tag)) return 0;
+            if (wParam == 1) soft_keys(hWnd, d, d->row->titleKey);
+            break;
+        case MSG_PAINT:
+            if (mmi_ownwnd_refuses(&st->wnd, message, tag)) return 0;
+            paint(hWnd, d);
+            return 0;
+        case MSG_CALLBACK:
+            take_reports(hWnd, d);
+            return 0;
+        case MSG_KEYDOWN:
+            if (wParam == MMI_KEY_PASS && st->passOffered) {
+                pass_and_close(hWnd, d);
+            } else if (wParam == MMI_KEY_FAIL) {
+                fail_and_close(hWnd, d);
+            }
+            return 0;
+        case MSG_FAILANDQUIT:
+            fail_and_close(hWnd, d);
+            return 0;
+        case MSG_CLOSE:
+            lib_stop(d);
+            mmi_ownwnd_destroy(&st->wnd, hWnd);
+            return 0;
+        default:
+            break;
+    }
+    return DefaultMainWinProc(hWnd, message, wParam, lParam);
+}
+
+// The PC's verdict, on the GUI thread.
+struct PcClose {
+    const mmi_sensorwnd_desc *d;
+    char *reply;
+    unsigned int size;
+    int answer;
+};
+
+int pc_close_on_gui(void *arg) {
+    PcClose *c = static_cast<PcClose *>(arg);
+    mmi_sensorwnd_state *st = c->d->state;
+    HWND hWnd = st->wnd.hwnd.load();
+    if (hWnd == HWND_INVALID) return -1;
+    size_t used = 0;
+    if (c->reply != nullptr && c->size > 0) {
+        used = (size_t)snprintf(c->reply, c->size, "*");
+        for (int i = 0; i < st->lineCount && used < c->size; i++) {
+            const int n = snprintf(c->reply + used, c->size - used, "%s%s=%d", i ? ";" : "",
+                                   st->lines[i].spec->key, st->lines[i].done);
+            if (n < 0) break;
+            used += (size_t)n;
+        }
+    }
+    const int answer = mmi_sensor_lines_done(st->lines, st->lineCount);
+    st->wnd.pcDriven = 0;
+    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    return answer;
+}
+
+// The window's open, on the GUI thread, for the PC.
+const mmi_sensorwnd_desc *s_pcOpening = nullptr;
+void *pc_open_on_gui(void) {
+    mmi_sensorwnd_open(s_pcOpening);
+    return nullptr;
+}
+
+}  // namespace
+
+void mmi_sensorwnd_report(const mmi_sensorwnd_desc *d, const module_data *data) {
+    mmi_sensorwnd_state *st = d->state;
+    {
+        std::lock_guard<std::mutex> lk(st->lock);
+        char *slot = st->queue[st->reports % MMI_SENSOR_QUEUE];
+        slot[0] = 0;
+        if (data != nullptr && data->data != nullptr) {
+            const size_t n = data->totallen < MMI_SENSOR_REPORT_SIZE - 1
+                                 ? data->totallen
+                                 : MMI_SENSOR_REPORT_SIZE - 1;
+            memcpy(slot, data->data, n);
+            slot[n] = 0;
+        }
+        st->reports++;
+    }
+    HWND hWnd = st->wnd.hwnd.load();
+    if (hWnd != HWND_INVALID && st->wnd.created.load()) PostMessage(hWnd, MSG_CALLBACK, 0, 0);
+}
+
+HWND mmi_sensorwnd_open(const mmi_sensorwnd_desc *d) {
+    if (d->bind && d->bind() != 0) {
+        SW_ERROR(d, "%s::bind fail, test not opened", __func__);
+        return HWND_INVALID;
+    }
+    if (setup_lines(d) == 0) {
+        SW_ERROR(d, "%s::no sensor is configured, test not opened", __func__);
+        return HWND_INVALID;
+    }
+    HWND hWnd = mmi_testwnd_create(d->caption, sensor_proc, reinterpret_cast<DWORD>(d));
+    return mmi_ownwnd_opened(&d->state->wnd, hWnd, d->stopEntry);
+}
+
+int mmi_sensorwnd_close(const mmi_sensorwnd_desc *d) {
+    return mmi_ownwnd_stop(&d->state->wnd);
+}
+
+int mmi_sensorwnd_pc_open(const mmi_sensorwnd_desc *d) {
+    // One PC command at a time: the command thread is the only opener of this kind.
+    s_pcOpening = d;
+    mmi_ownwnd_pc_open(&d->state->wnd, pc_open_on_gui);
+    return d->state->wnd.hwnd.load() != HWND_INVALID ? 1 : 0;
+}
+
+int mmi_sensorwnd_pc_close(const mmi_sensorwnd_desc *d, char *reply, unsigned int size) {
+    PcClose c{d, reply, size, 0};
+    const int answer = mmi_RunOnGuiThread(pc_close_on_gui, &c);
+    if (answer >= 0) tp_os_usleep(100000);
+    return answer;
+}
+
+unsigned mmi_sensorwnd_reports(const mmi_sensorwnd_desc *d) {
+    std::lock_guard<std::mutex> lk(d->state->lock);
+    return d->state->reports;
+}
+
+int mmi_sensorwnd_wait(const mmi_sensorwnd_desc *d, unsigned before, int tries,
+                       mmi_sensor_report *out) {
+    mmi_sensorwnd_state *st = d->state;
+    for (int i = 0; i < tries; i++) {
+        {
+            std::lock_guard<std::mutex> lk(st->lock);
+            if (st->reports != before) {
+                parse_last(st, out);
+                return 0;
+            }
+        }
+        tp_os_usleep(100000);
+    }
+    SW_ERROR(d, "%s::no report from the library", __func__);
+    return -1;
+}
+
+int mmi_sensorwnd_fresh_report(const mmi_sensorwnd_desc *d, mmi_sensor_report *out, int tries) {
+    mmi_sensorwnd_state *st = d->state;
+    if (d->bind && d->bind() != 0) return -1;
+    const unsigned before = mmi_sensorwnd_reports(d);
+    const bool ours = !st->running.load();
+    if (ours) {
+        if (d->start == nullptr || d->start(d->callback) != 0) {
+            SW_ERROR(d, "%s::library start fail", __func__);
+            return -1;
+        }
+        st->running = 1;
+    }
+    const int rc = mmi_sensorwnd_wait(d, before, tries, out);
+    // A window opened meanwhile keeps the library running.
+    if (ours && st->wnd.hwnd.load() == HWND_INVALID) lib_stop(d);
+    return rc;
+}
