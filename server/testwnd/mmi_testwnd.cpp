@@ -429,6 +429,16 @@ void mmi_testwnd_record_fail(int resultIndex) {
     mmi_run_fail(MMI_RUN_AUTO, resultIndex);
 }
 
+void mmi_testwnd_pass_and_close(HWND hWnd, int resultIndex, const char *domain) {
+    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    mmi_testwnd_record_pass(resultIndex, domain);
+}
+
+void mmi_testwnd_fail_and_close(HWND hWnd, int resultIndex) {
+    mmi_testwnd_record_fail(resultIndex);
+    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+}
+
 void mmi_testwnd_pass(const mmi_testwnd_desc *d) {
     mmi_run_pass(d->run, d->row->resultIndex, domain_of(d));
 }

@@ -109,6 +109,10 @@ void mmi_testwnd_stop_foolproof(mmi_testwnd_state *st);
 // Pass or fail of a test in the automatic run (recorded and chained only while it runs).
 void mmi_testwnd_record_pass(int resultIndex, const char *domain);
 void mmi_testwnd_record_fail(int resultIndex);
+// A window's end with its verdict: a pass closes the window first (the run's next item
+// then opens in front of what was under it), a fail is recorded first.
+void mmi_testwnd_pass_and_close(HWND hWnd, int resultIndex, const char *domain);
+void mmi_testwnd_fail_and_close(HWND hWnd, int resultIndex);
 // The same for a window of either run kind.
 void mmi_testwnd_pass(const mmi_testwnd_desc *d);
 void mmi_testwnd_fail(const mmi_testwnd_desc *d);

@@ -219,15 +219,13 @@ void pass_key(HWND hWnd, int id) {
     }
     stop_loop(id);
     r.passes = 0;
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
-    mmi_testwnd_record_pass(kMembers[id].row->resultIndex, tag_of(id));
+    mmi_testwnd_pass_and_close(hWnd, kMembers[id].row->resultIndex, tag_of(id));
 }
 
 void fail_key(HWND hWnd, int id) {
     stop_loop(id);
     s_run[id].passes = 0;
-    mmi_testwnd_record_fail(kMembers[id].row->resultIndex);
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    mmi_testwnd_fail_and_close(hWnd, kMembers[id].row->resultIndex);
 }
 
 LRESULT loopback_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {

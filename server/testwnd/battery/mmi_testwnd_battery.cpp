@@ -102,13 +102,11 @@ void offer_pass(HWND hWnd, bool offer) {
 }
 
 void pass_and_close(HWND hWnd) {
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
-    mmi_testwnd_record_pass(catalogue::Battery.resultIndex, kTag);
+    mmi_testwnd_pass_and_close(hWnd, catalogue::Battery.resultIndex, kTag);
 }
 
 void fail_and_close(HWND hWnd) {
-    mmi_testwnd_record_fail(catalogue::Battery.resultIndex);
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    mmi_testwnd_fail_and_close(hWnd, catalogue::Battery.resultIndex);
 }
 
 // Reads and judges every line; true when the window is to pass now.

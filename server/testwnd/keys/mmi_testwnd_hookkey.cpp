@@ -62,13 +62,11 @@ void soft_keys(HWND hWnd, bool pass, const char *titleKey) {
 }
 
 void pass_and_close(HWND hWnd) {
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
-    mmi_testwnd_record_pass(catalogue::Keys.resultIndex, kTag);
+    mmi_testwnd_pass_and_close(hWnd, catalogue::Keys.resultIndex, kTag);
 }
 
 void fail_and_close(HWND hWnd) {
-    mmi_testwnd_record_fail(catalogue::Keys.resultIndex);
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    mmi_testwnd_fail_and_close(hWnd, catalogue::Keys.resultIndex);
 }
 
 void paint(HWND hWnd) {

@@ -79,24 +79,19 @@ void lib_stop(const mmi_sensorwnd_desc *d) {
 }
 
 void soft_keys(HWND hWnd, const mmi_sensorwnd_desc *d, const char *titleKey) {
-    char pass[MMI_TESTWND_TEXT_SIZE], fail[MMI_TESTWND_TEXT_SIZE];
-    mmi_translate("Result_pass", pass, sizeof(pass));
-    mmi_translate("Result_fail", fail, sizeof(fail));
-    mmi_testwnd_set_bars(hWnd, titleKey, d->state->passOffered ? pass : "", "", fail);
+    mmi_testwnd_show_keys(hWnd, titleKey, d->state->passOffered ? MMI_TIMER_FOOLPROOF : 0);
 }
 
 void pass_and_close(HWND hWnd, const mmi_sensorwnd_desc *d) {
     SW_DEBUG(d, "%s", __func__);
     lib_stop(d);
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
-    mmi_testwnd_record_pass(d->row->resultIndex, d->row->domain);
+    mmi_testwnd_pass_and_close(hWnd, d->row->resultIndex, d->row->domain);
 }
 
 void fail_and_close(HWND hWnd, const mmi_sensorwnd_desc *d) {
     SW_DEBUG(d, "%s", __func__);
     lib_stop(d);
-    mmi_testwnd_record_fail(d->row->resultIndex);
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
+    mmi_testwnd_fail_and_close(hWnd, d->row->resultIndex);
 }
 
 // The last report, parsed; call with the lock held and at least one report.
