@@ -27,7 +27,6 @@ void ftx_set_reboot_hook(ftx_reboot_hook_fn fn);
  * (tests that switch roots). */
 void ftx_host_reset(void);
 
-
 /* 1 once the system partition was remounted writable (dev_mount with MS_REMOUNT on
  * "/system"), else 0: the root's "/system" is read-only to the PC's file operations. */
 int ftx_host_system_writable(void);
@@ -46,6 +45,11 @@ void ftx_host_register_hw(const char *name, ftx_sim_control_fn fn);
 /* Offers line to every registered library in turn. Returns -1 with reply
  * "no hardware" when none claims it. */
 int ftx_host_hw_dispatch(const char *line, char *reply, size_t size);
+
+/* The handset's notification LED as the simulated screen shows it: with on non-zero a dot
+ * of colour rgb (0xRRGGBB) at the right end of the title strip, drawn over what the display
+ * shows and what a screenshot records (whatever the backlight); on 0 removes it. */
+void ftx_host_set_indicator(int on, unsigned int rgb);
 
 #ifdef __cplusplus
 }

@@ -168,7 +168,7 @@ const ftx_sym_binding kFingerPrintSet[] = {REQ(ftx_api_FingerPrintTest_Start),
                                            REQ(ftx_api_FingerPrintTest_Stop)};
 const ftx_sym_binding kSimSdSet[] = {REQ(ftx_api_SimCard_Test_Start),
                                      REQ(ftx_api_SimCard_Test_Stop), REQ(ftx_api_SDCard_Test_Start),
-                                     REQ(ftx_api_SDCard_Test_Stop)};
+                                     REQ(ftx_api_SDCard_Test_Stop), OPT(ftx_api_SDCard_Get_Size)};
 const ftx_sym_binding kNfcSet[] = {REQ(ftx_api_NFC_Start), REQ(ftx_api_NFC_Stop)};
 const ftx_sym_binding kSarSet[] = {REQ(ftx_api_sar_start), REQ(ftx_api_sar_stop)};
 const ftx_sym_binding kSmartPaSet[] = {REQ(ftx_api_SmartPACalibrate_Start),
@@ -178,6 +178,8 @@ const ftx_sym_binding kTpSelfSet[] = {REQ(ftx_api_tpd_SelfTest_Start),
                                       REQ(ftx_api_tpd_SelfTest_Stop), REQ(ftx_api_GetFireWare)};
 const ftx_sym_binding kFirmwareSet[] = {REQ(ftx_api_GetFireWare)};
 const ftx_sym_binding kBatteryTestSet[] = {REQ(ftx_api_Battery_Test)};
+// The preview is optional: a library without it gives the window no frames.
+const ftx_sym_binding kCameraSet[] = {ANY(ftx_api_camera_get_preview)};
 const ftx_sym_binding kAgingSet[] = {
     REQ(ftx_api_AlllightTest_Start),   REQ(ftx_api_AlllightTest_Stop),
     REQ(ftx_api_Audio_RingTest_Start), REQ(ftx_api_Audio_RingTest_Stop),
@@ -255,6 +257,7 @@ const feature_binder kHardVersion =
     FEATURE("Init_lib_HardVersion_Interface", "FTX_MONOMER_HARDVERSION", kFirmwareSet);
 const feature_binder kBatteryTest =
     FEATURE("Init_lib_Battery_Interface", "FTX_BATTERY", kBatteryTestSet);
+const feature_binder kCamera = FEATURE("Init_lib_Camera_Interface", "FTX_CAMERA_BACK", kCameraSet);
 const feature_binder kAging = FEATURE("Init_lib_AgingTest_Interface", "AgingTest", kAgingSet);
 const feature_binder kPcba = FEATURE("Init_lib_Interface_all", "FTX_CPU", kPcbaSet);
 
@@ -451,6 +454,9 @@ int Init_lib_HardVersion_Interface(void) {
 }
 int Init_lib_Battery_Interface(void) {
     return bind_feature(kBatteryTest, nullptr);
+}
+int Init_lib_Camera_Interface(void) {
+    return bind_feature(kCamera, nullptr);
 }
 int Init_lib_AgingTest_Interface(void) {
     return bind_feature(kAging, nullptr);

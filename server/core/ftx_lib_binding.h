@@ -31,6 +31,7 @@
     X(ftx_api_camera_start_capture)                             \
     X(ftx_api_camera_do_autofocus)                              \
     X(ftx_api_camera_test_stop)                                 \
+    X(ftx_api_camera_get_preview)                               \
     X(ftx_api_Vibrator_Test_Start)                              \
     X(ftx_api_Vibrator_Test_Stop)                               \
     X(ftx_api_AllCard_Test_Start)                               \
@@ -102,6 +103,7 @@
     X(ftx_api_SimCard_Test_Stop)                                \
     X(ftx_api_SDCard_Test_Start)                                \
     X(ftx_api_SDCard_Test_Stop)                                 \
+    X(ftx_api_SDCard_Get_Size)                                  \
     X(ftx_api_NFC_Start)                                        \
     X(ftx_api_NFC_Stop)                                         \
     X(ftx_api_sar_start)                                        \
@@ -270,6 +272,9 @@ int Init_Hifi_Interface(void);
 int Init_lib_TPSelf_Interface(void);
 int Init_lib_HardVersion_Interface(void);
 int Init_lib_Battery_Interface(void);
+// The camera window's preview, left unbound without a word when the library lacks it (0 then
+// too; -1 only without the library).
+int Init_lib_Camera_Interface(void);
 int Init_lib_AgingTest_Interface(void);
 // The PCBA run's set: every symbol looked up unchecked; 0 whenever the library is open.
 int Init_lib_Interface_all(void);

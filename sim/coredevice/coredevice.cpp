@@ -44,7 +44,10 @@ __attribute__((constructor)) void register_coredevice() {
 
 int switch_link(const char *op, bool on) {
     int ok = call(op, g_linkFails.load() ? 0 : 1);
-    if (ok & 1) g_linkOn.store(on);
+    if (ok & 1) {
+        g_linkOn.store(on);
+        put_value("wifilink.on", on ? 1 : 0);  // the factory's lights tell what they saw
+    }
     return ok;
 }
 

@@ -175,22 +175,25 @@ extern "C" int ftx_api_GetTestInfoFlag(unsigned char *flags) {
     return rc;
 }
 
+// The cameras: a forced answer of non-zero starts, captures and stops nothing.
 extern "C" int ftx_api_camera_test_start(int camera) {
-    return call("ftx_api_camera_test_start", model().camera_ok(camera) ? 0 : -1, "%d", camera);
+    int rc = call("ftx_api_camera_test_start", model().camera_ok(camera) ? 0 : -1, "%d", camera);
+    return rc == 0 ? model().camera_start(camera, true) : rc;
 }
 extern "C" int ftx_api_camera_start_capture(int camera, const char *path) {
     int rc = call("ftx_api_camera_start_capture", model().camera_ok(camera) ? 0 : -1, "%d,%s",
                   camera, path != nullptr ? path : "(null)");
-    if (rc == 0 && path != nullptr) {
-        FILE *f = dev_fopen(path, "wb");
-        if (f == nullptr) return -1;
-        fprintf(f, "simulated picture of camera %d\n", camera);
-        fclose(f);
-    }
-    return rc;
+    return rc == 0 ? model().camera_capture(camera, path) : rc;
+}
+extern "C" int ftx_api_camera_get_preview(int camera, unsigned int *argb, int width, int height) {
+    // Not recorded: the preview asks for a frame several times a second.
+    return model().camera_frame(camera, argb, width, height);
 }
 SIM_INT(ftx_api_camera_do_autofocus, camera)
-SIM_INT(ftx_api_camera_test_stop, camera)
+extern "C" int ftx_api_camera_test_stop(int camera) {
+    int rc = call("ftx_api_camera_test_stop", 0, "camera=%d", camera);
+    return rc == 0 ? model().camera_start(camera, false) : rc;
+}
 SIM_INT(ftx_api_Vibrator_Test_Start, ms)
 SIM_PLAIN(ftx_api_Vibrator_Test_Stop)
 SIM_CB(ftx_api_AllCard_Test_Start)
@@ -283,18 +286,34 @@ extern "C" int ftx_api_HookKeyTest_Stop(char *reply, unsigned int size) {
     if (reply != nullptr && size > 0) snprintf(reply, size, "*%d", presses);
     return call("ftx_api_HookKeyTest_Stop", 0, "%u", size);
 }
-SIM_INT(ftx_api_FlashlightTest_Start, flashlight)
-SIM_INT(ftx_api_FlashlightTest_Stop, flashlight)
-SIM_PLAIN(ftx_api_AlllightTest_Start)
-SIM_PLAIN(ftx_api_AlllightTest_Stop)
-SIM_PLAIN(ftx_api_KeyBacklightTest_Start)
-SIM_PLAIN(ftx_api_KeyBacklightTest_Stop)
+// The lights: a forced answer of non-zero switches nothing.
+extern "C" int ftx_api_FlashlightTest_Start(int flashlight) {
+    int known = flashlight >= FTX_FLASHLIGHT_BACK && flashlight <= FTX_FLASHLIGHT_BACK2 ? 0 : -1;
+    int rc = call("ftx_api_FlashlightTest_Start", known, "flashlight=%d", flashlight);
+    return rc == 0 ? model().set_flashlight(flashlight, true) : rc;
+}
+extern "C" int ftx_api_FlashlightTest_Stop(int flashlight) {
+    int known = flashlight >= FTX_FLASHLIGHT_BACK && flashlight <= FTX_FLASHLIGHT_BACK2 ? 0 : -1;
+    int rc = call("ftx_api_FlashlightTest_Stop", known, "flashlight=%d", flashlight);
+    return rc == 0 ? model().set_flashlight(flashlight, false) : rc;
+}
+#define SIM_LIGHT(name, action)      \
+    extern "C" int name(void) {      \
+        int rc = call(#name, 0);     \
+        if (rc == 0) model().action; \
+        return rc;                   \
+    }
+SIM_LIGHT(ftx_api_AlllightTest_Start, set_all_lights(true))
+SIM_LIGHT(ftx_api_AlllightTest_Stop, set_all_lights(false))
+SIM_LIGHT(ftx_api_KeyBacklightTest_Start, set_key_backlight(true))
+SIM_LIGHT(ftx_api_KeyBacklightTest_Stop, set_key_backlight(false))
+SIM_LIGHT(ftx_api_LEDColorTest_Stop, set_led(nullptr))
 extern "C" int ftx_api_LEDColorTest_Start(const char *color) {
     bool known = color != nullptr && (strcmp(color, "red") == 0 || strcmp(color, "green") == 0 ||
                                       strcmp(color, "orange") == 0);
-    return call("ftx_api_LEDColorTest_Start", known ? 0 : -1, "%s", color ? color : "(null)");
+    int rc = call("ftx_api_LEDColorTest_Start", known ? 0 : -1, "%s", color ? color : "(null)");
+    return rc == 0 ? model().set_led(color) : rc;
 }
-SIM_PLAIN(ftx_api_LEDColorTest_Stop)
 extern "C" int ftx_api_Set_LCDBacklight(unsigned int level) {
     int rc = call("ftx_api_Set_LCDBacklight", 0, "%u", level);
     if (rc == 0) model().set_backlight(level);
@@ -331,6 +350,9 @@ extern "C" int ftx_api_SDCard_Test_Start(int slot) {
     return call("ftx_api_SDCard_Test_Start", model().sd_present(slot), "%d", slot);
 }
 SIM_PLAIN(ftx_api_SDCard_Test_Stop)
+extern "C" int ftx_api_SDCard_Get_Size(int slot) {
+    return call("ftx_api_SDCard_Get_Size", model().sd_size(slot), "%d", slot);
+}
 SIM_CB(ftx_api_NFC_Start)
 SIM_PLAIN(ftx_api_NFC_Stop)
 SIM_LISTEN(ftx_api_sar_start)

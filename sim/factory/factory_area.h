@@ -76,5 +76,6 @@ extern const Area kFirmwareArea;
 extern const Area kPcbaArea;
 extern const Area kSensorsArea;
 extern const Area kDisplayArea;
+extern const Area kLightsArea;
 
 }  // namespace ftxsim

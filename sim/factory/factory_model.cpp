@@ -3,6 +3,7 @@
 // the areas' words and automatic replies.
 #include "factory_model.h"
 
+#include <stdio.h>
 #include <string.h>
 
 #include <map>
@@ -126,7 +127,7 @@ constinit const Area kCoreArea = {
 // force-touch names are matched before any name holding "Loopback".
 const Area *const kAreas[] = {
     &kSensorsArea, &kPcbaArea,  &kAudioArea, &kTouchArea,    &kInfoArea,    &kCameraArea,
-    &kCardsArea,   &kRadioArea, &kCoreArea,  &kFirmwareArea, &kDisplayArea,
+    &kCardsArea,   &kRadioArea, &kCoreArea,  &kFirmwareArea, &kDisplayArea, &kLightsArea,
 };
 
 // Events an operation sends by itself when started.
@@ -150,6 +151,8 @@ void print_state(Reply &r) {
     kCameraArea.state(r);
     r.add("\ndisplay:");
     kDisplayArea.state(r);
+    r.add("\nlights:");
+    kLightsArea.state(r);
     r.add("\nsensors:");
     kSensorsArea.state(r);
     r.add("\n");
@@ -162,14 +165,19 @@ int control_fn(const char *line, char *reply, size_t size) {
 // One table of every area's words, kept for the library's life (the core keeps its address).
 // Plain static storage: nothing to destroy while the worker may still run at exit, and
 // nothing left on the heap when a test unloads the library.
-constexpr size_t kMaxWords = 64;
+constexpr size_t kMaxWords = 128;
 Word g_words[kMaxWords];
 
 __attribute__((constructor)) void register_factory() {
     size_t n = 0;
     for (const Area *area : kAreas)
         for (const Word &w : area->words)
-            if (n < kMaxWords) g_words[n++] = w;
+            if (n < kMaxWords) {
+                g_words[n++] = w;
+            } else {
+                // A word left out would answer "unknown" with no hint why: say so at load.
+                fprintf(stderr, "lib_factory: no room for the hw word \"%s\"\n", w.word);
+            }
     add_words(g_words, n, print_state);
     ftx_host_register_hw("factory", control_fn);
 }

@@ -34,8 +34,16 @@ class FactoryModel {
     // Sets the hook callback; returns the presses counted since the previous set.
     int set_hook_cb(ftx_api_hookkey_cb cb);
     bool camera_ok(int id);
+    // A camera's preview: started by its test start (-1 for a broken camera or an id outside
+    // 0..31), ended by its stop. camera_frame draws the started camera's moving test pattern;
+    // camera_capture saves it as a PNG picture at a device path. 0, or -1 when the camera is not
+    // started, is broken or the size or path is refused.
+    int camera_start(int id, bool on);
+    int camera_frame(int id, unsigned *argb, int w, int h);
+    int camera_capture(int id, const char *path);
     int sim_present(int slot);
     int sd_present(int slot);
+    int sd_size(int slot);  // MB; 0 when empty, -1 on a bad slot
     // 0 when the device answers, -1 when the console made it fail.
     int detect(const char *name);
     void firmware(char *buf, size_t size);
@@ -43,6 +51,13 @@ class FactoryModel {
     // power.
     void set_backlight(unsigned level);
     void set_lcd(bool on);
+    // The lights: a flashlight (FTX_FLASHLIGHT_...; -1 for another number), the LED's
+    // colour ("red", "green", "orange"; null turns it off; -1 for another colour), the key
+    // backlight, and every light at once.
+    int set_flashlight(int flashlight, bool on);
+    int set_led(const char *colour);
+    void set_key_backlight(bool on);
+    void set_all_lights(bool on);
     // The sensor area's reports: a start of the sensor, Hall, SAR or force-touch test makes
     // the model report to cb (the sensor test also every 200 ms, scaled) until its stop; any
     // other op changes nothing.

@@ -1,5 +1,4 @@
-// Radio area of the factory model: whether the Bluetooth, FM and Wi-Fi devices answer, and
-// the NFC test's event.
+// Radio area of the factory model: whether the Bluetooth, FM and Wi-Fi devices answer.
 #include <map>
 #include <mutex>
 #include <string>
@@ -15,11 +14,6 @@ struct Radio {
 
 Radio &radio() {
     return model_part<Radio>();
-}
-
-Event reply(const std::string &op) {
-    if (op == "ftx_api_NFC_Start") return {FTX_DATATYPE_NFC, "result=pass"};
-    return no_event();
 }
 
 }  // namespace
@@ -47,7 +41,6 @@ int w_detect(const Args &a, Reply &r) {
 
 constinit const Area kRadioArea = {
     .words = {{"detect", "bt|fm|wifi ok|fail", w_detect}},
-    .reply = reply,
 };
 
 }  // namespace ftxsim

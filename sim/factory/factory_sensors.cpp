@@ -219,7 +219,6 @@ Event reply(const std::string &op) {
             std::string("result=") + (pass ? "pass" : "fail") + ";value=" + std::to_string(s.force),
             false, kForceResultDelayMs};
     }
-    if (op == "ftx_api_FingerPrintTest_Start") return {FTX_DATATYPE_FINGERPRINT, "result=pass"};
     return no_event();
 }
 

@@ -64,10 +64,11 @@ inline const std::vector<std::string> &all_domains() {
     return kDomains;
 }
 
-// An enabled item and its run flags.
+// An enabled item, its run flags and, when given, its parameter.
 struct Item {
     const char *domain;
     int autoF, mmi, pre;
+    const char *parameter = nullptr;
 };
 
 // A screenshot, RGB.
@@ -135,9 +136,10 @@ struct Png {
     }
 };
 
-// The card test has no window yet: its entry only logs, which is enough to see a run open it.
-inline constexpr Item kCards = {"FTX_CARDS", 1, 0, 1};
-inline constexpr char kCardsOpened[] = "mmi_testwnd_SIMMEMTestEntry: test not available yet";
+// The all-cards test as the run's next item: it opens and waits (the image's slots 3 and 4
+// are empty) far longer than a test runs, so the run stays on it until a key ends it.
+inline constexpr Item kCards = {"FTX_CARDS", 1, 0, 1, "SimSlots:4;Timeout:3600"};
+inline constexpr char kCardsOpened[] = "FTX_CARDS: test window open";
 
 inline bool light(int r, int g, int b) {
     return r > 150 && g > 150 && b > 150;
@@ -167,7 +169,15 @@ class Handset {
             dut.setConfig(i.domain, "auto", std::to_string(i.autoF));
             dut.setConfig(i.domain, "mmi", std::to_string(i.mmi));
             dut.setConfig(i.domain, "pre", std::to_string(i.pre));
+            if (i.parameter != nullptr) dut.setConfig(i.domain, "parameter", i.parameter);
         }
+        dut.setConfig("MMI", "restore_autotest", "0");
+        dut.setEnv("FTX_TIME_SCALE", std::to_string(timeScale));
+    }
+
+    // The image's own configuration: every item it enables, with its parameters.
+    struct ImageConfig {};
+    explicit Handset(ImageConfig, double timeScale = 0.25) {
         dut.setConfig("MMI", "restore_autotest", "0");
         dut.setEnv("FTX_TIME_SCALE", std::to_string(timeScale));
     }

@@ -1,7 +1,8 @@
 // The framebuffer, the system colours, start-up, and the display backends: "headless"
 // keeps the picture in memory only; "sdl" shows it in a desktop window scaled to fit, with
 // the PC keyboard as the handset's keys and the mouse as the finger. The backlight and
-// blank files of the device root dim what is shown and what a screenshot records.
+// blank files of the device root dim what is shown and what a screenshot records; the
+// notification LED's dot is drawn over both.
 #include <SDL2/SDL.h>
 #include <png.h>
 #include <stdio.h>
@@ -33,6 +34,21 @@ namespace {
 const char *kTag = "FTX_GUI";
 std::once_flag g_initOnce;
 std::atomic<bool> g_sdl{false};
+// The notification LED's dot: kIndicatorOn with its colour in the low 24 bits, or 0.
+const unsigned kIndicatorOn = 1u << 24;
+std::atomic<unsigned> g_indicator{0};
+
+// A filled dot at the right end of the title strip (the strip is width/15 + 10 high).
+void draw_indicator(std::vector<Uint32> &out) {
+    const unsigned ind = g_indicator.load();
+    if ((ind & kIndicatorOn) == 0) return;
+    const int r = std::max(3, g_fbW / 60);
+    const int cx = g_fbW - g_fbW / 20, cy = (g_fbW / 15 + 10) / 2;
+    for (int y = std::max(0, cy - r); y <= cy + r && y < g_fbH; y++)
+        for (int x = std::max(0, cx - r); x <= cx + r && x < g_fbW; x++)
+            if ((x - cx) * (x - cx) + (y - cy) * (y - cy) <= r * r)
+                out[static_cast<size_t>(y) * g_fbW + x] = ind & 0xFFFFFFu;
+}
 
 int read_int_file(const char *devicePath, int fallback) {
     FILE *f = dev_fopen(devicePath, "r");
@@ -228,6 +244,7 @@ void present_copy(std::vector<Uint32> &out) {
         std::fill(out.begin(), out.end(), 0);
     else
         memcpy(out.data(), g_fb, n * sizeof(Uint32));
+    draw_indicator(out);
 }
 
 int write_png(const char *path, int width, int height, const Uint32 *pixels) {
@@ -328,6 +345,11 @@ void ftx_gui_lock_framebuffer(void) {
 }
 void ftx_gui_unlock_framebuffer(void) {
     g_fbLock.unlock();
+}
+
+void ftx_host_set_indicator(int on, unsigned int rgb) {
+    g_indicator.store(on != 0 ? kIndicatorOn | (rgb & 0xFFFFFFu) : 0);
+    g_fbSerial++;  // the window shows it at its next look
 }
 
 const char *ftx_gui_backend(void) {

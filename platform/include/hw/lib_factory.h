@@ -55,14 +55,14 @@ typedef void (*ftx_api_hookkey_cb)(unsigned int *status);
 #define FTX_DATATYPE_SENSOR 130
 #define FTX_DATATYPE_HALL 131        /* state=near|far */
 #define FTX_DATATYPE_FINGERPRINT 132 /* result=pass|fail */
-#define FTX_DATATYPE_NFC 133         /* result=pass|fail */
+#define FTX_DATATYPE_NFC 133         /* result=pass;uid=UID | result=fail */
 #define FTX_DATATYPE_SAR 134         /* value=N;aux=M (main and auxiliary SAR readings) */
 #define FTX_DATATYPE_SMARTPA 135     /* result=pass|fail;value=N */
 #define FTX_DATATYPE_OTG 136         /* result=pass|fail */
 /* value=N (grams pressed), or result=pass|fail;value=N from a calibration or the
  * comprehensive test */
 #define FTX_DATATYPE_FORCETOUCH 137
-#define FTX_DATATYPE_LOOPBACK 138    /* result=pass|fail (acoustic loopback, wake-up mic) */
+#define FTX_DATATYPE_LOOPBACK 138 /* result=pass|fail (acoustic loopback, wake-up mic) */
 /* Touch self-test verdicts arrive as the datatype itself (0 pass, -1, -2, -4, or a bit set of
  * failures); a verdict with failures may carry "x,y,num,px,py,..." raw failure data. */
 
@@ -116,6 +116,10 @@ int ftx_api_camera_test_start(int camera);
 int ftx_api_camera_start_capture(int camera, const char *path);
 int ftx_api_camera_do_autofocus(int camera);
 int ftx_api_camera_test_stop(int camera);
+/* Copies the started camera's current preview frame, width x height pixels of 0x00RRGGBB row
+ * after row, into argb; -1 when the camera is not started or gives no picture, or the size is
+ * not 1..4096 a side. Optional: a library without it shows no preview. */
+int ftx_api_camera_get_preview(int camera, unsigned int *argb, int width, int height);
 /* Vibrates for ms milliseconds; -1 until stopped. */
 int ftx_api_Vibrator_Test_Start(int ms);
 int ftx_api_Vibrator_Test_Stop(void);
@@ -210,6 +214,8 @@ int ftx_api_SimCard_Test_Start(int slot);
 int ftx_api_SimCard_Test_Stop(void);
 int ftx_api_SDCard_Test_Start(int slot);
 int ftx_api_SDCard_Test_Stop(void);
+/* The SD card's size in MB: 0 when the slot is empty, -1 on a bad slot (only slot 0). */
+int ftx_api_SDCard_Get_Size(int slot);
 int ftx_api_NFC_Start(ftx_api_module_cb cb);
 int ftx_api_NFC_Stop(void);
 int ftx_api_sar_start(ftx_api_module_cb cb);

@@ -103,7 +103,8 @@ void forget(int tag) {
 
 // Returns once the worker has run every job posted before: they come before the marker.
 void drain() {
-    ASSERT_EQ(ftx_api_FingerPrintTest_Start(collect<MARK>), 0);
+    ASSERT_EQ(ftx_api_FingerPrintTest_Start(collect<MARK>), 0);  // sends nothing by itself
+    ASSERT_TRUE(has(hw("finger press"), "sent"));
     ASSERT_EQ(next(MARK).datatype, FTX_DATATYPE_FINGERPRINT);
 }
 
