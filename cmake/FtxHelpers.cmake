@@ -42,6 +42,15 @@ function(ftx_add_bench name)
   set_target_properties(${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bench)
 endfunction()
 
+# ftx_add_device_bench(name source): a benchmark that starts the real ftx-mmi headless
+# through the tests' device support (bench/support for its process figures).
+function(ftx_add_device_bench name source)
+  ftx_add_bench(${name} SOURCES ${source} ${PROJECT_SOURCE_DIR}/tests/support/device_under_test.cpp)
+  target_include_directories(${name} PRIVATE ${PROJECT_SOURCE_DIR}/tests ${PROJECT_SOURCE_DIR}/bench)
+  target_compile_definitions(${name} PRIVATE FTX_BENCH_SOURCE_DIR="${PROJECT_SOURCE_DIR}"
+    FTX_BENCH_BUILD_DIR="${CMAKE_BINARY_DIR}")
+endfunction()
+
 # ftx_subdirs(dir): add every direct subfolder of dir that has a CMakeLists.txt.
 function(ftx_subdirs dir)
   file(GLOB children CONFIGURE_DEPENDS ${dir}/*/CMakeLists.txt)

@@ -4,30 +4,13 @@
 #include <stdlib.h>
 #include <unistd.h>
 
-#include <fstream>
-#include <sstream>
 #include <string>
 #include <thread>
 
 #include "support/device_under_test.h"
+#include "support/proc_figures.h"
 
 namespace {
-
-// utime + stime of the process, in clock ticks.
-long long cpu_ticks(pid_t pid) {
-    std::ifstream in("/proc/" + std::to_string(pid) + "/stat");
-    std::string stat((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-    size_t close = stat.rfind(')');
-    if (close == std::string::npos) return -1;
-    std::istringstream rest(stat.substr(close + 2));
-    std::string field;
-    long long utime = 0, stime = 0;
-    for (int i = 3; i <= 15 && rest >> field; i++) {
-        if (i == 14) utime = atoll(field.c_str());
-        if (i == 15) stime = atoll(field.c_str());
-    }
-    return utime + stime;
-}
 
 // The preview frames the library has given since the camera started ("hw camera").
 long frames(const DeviceUnderTest &dut) {
@@ -55,9 +38,9 @@ int main() {
     std::this_thread::sleep_for(std::chrono::seconds(1));  // the window settles
     const double seconds = 5.0;
     const long framesBefore = frames(dut);
-    const long long before = cpu_ticks(dut.pid());
+    const long long before = bench::cpu_ticks(dut.pid());
     std::this_thread::sleep_for(std::chrono::duration<double>(seconds));
-    const long long after = cpu_ticks(dut.pid());
+    const long long after = bench::cpu_ticks(dut.pid());
     const long shown = frames(dut) - framesBefore;
     dut.pc("backcameraMoudle testItem close");
     const double cpuPercent = 100.0 * (after - before) / sysconf(_SC_CLK_TCK) / seconds;
