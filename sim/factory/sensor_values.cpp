@@ -86,7 +86,14 @@ bool take(int s, const std::vector<double> &vs, int count, SensorLine *out, std:
             *why = text;
             return false;
         }
-        (i < static_cast<size_t>(k.width) ? out->a : out->b)[i % k.width] = vs[i];
+        // The first width values start the wave (or are the values set), the next turn it.
+        // Kept as two plain stores: GCC's UBSan instrumentation lost the store through a
+        // conditional array expression.
+        if (i < static_cast<size_t>(k.width)) {
+            out->a[i] = vs[i];
+        } else {
+            out->b[i - static_cast<size_t>(k.width)] = vs[i];
+        }
     }
     return true;
 }
