@@ -207,6 +207,37 @@ void mmi_testwnd_draw_top_line(HDC hdc) {
     LineTo(hdc, g_ptScreenInfo.width, 0);
 }
 
+int mmi_testwnd_draw_note(HDC hdc, const char *noteKey) {
+    const int w = g_ptScreenInfo.width;
+    char text[MMI_TESTWND_NOTE_SIZE];
+    mmi_translate(noteKey, text, sizeof(text));
+    SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
+    const int top = w / 15 + 10;
+    RECT note = {w / 16, top, w - w / 16, top};
+    DrawText(hdc, text, -1, &note, DT_WORDBREAK | DT_CALCRECT);  // as many lines as it takes
+    note.right = w - w / 16;
+    DrawText(hdc, text, -1, &note, DT_WORDBREAK);
+    return note.bottom;
+}
+
+void mmi_testwnd_draw_rule(HDC hdc, int y) {
+    SetPenColor(hdc, mmi_pixel(MMI_COLOUR_FRAME));
+    SetPenWidth(hdc, 1);
+    MoveTo(hdc, 0, y);
+    LineTo(hdc, g_ptScreenInfo.width, y);
+}
+
+void mmi_testwnd_draw_row(HDC hdc, int top, int height, const char *label, const char *value,
+                          bool passed, int valueRight) {
+    const int w = g_ptScreenInfo.width;
+    mmi_testwnd_draw_rule(hdc, top);
+    SetTextColor(hdc, mmi_pixel(passed ? MMI_COLOUR_PASS : MMI_COLOUR_FAIL));
+    RECT l = {w / 16, top, w * 3 / 8, top + height};
+    DrawText(hdc, label, -1, &l, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+    RECT v = {w * 3 / 8 + w / 48, top, valueRight, top + height};
+    DrawText(hdc, value, -1, &v, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+}
+
 void mmi_testwnd_rect(int w, int h, RECT *out) {
     out->left = 0;
     out->top = w / 15 + 10;
@@ -260,14 +291,30 @@ int close_own(void *arg) {
     return 1;
 }
 
+struct OwnOpen {
+    void (*open)(const void *ctx);
+    const void *ctx;
+};
+
 int open_own(void *arg) {
-    reinterpret_cast<void *(*)(void)>(arg)();
+    const OwnOpen *o = static_cast<const OwnOpen *>(arg);
+    o->open(o->ctx);
     return 1;
+}
+
+// The forms without a context: the plain function travels as the context.
+void open_plain(const void *ctx) {
+    reinterpret_cast<void *(*)(void)>(const_cast<void *>(ctx))();
+}
+
+int verdict_plain(const void *ctx, char *reply, unsigned int size) {
+    return reinterpret_cast<int (*)(char *, unsigned int)>(const_cast<void *>(ctx))(reply, size);
 }
 
 struct OwnStop {
     mmi_ownwnd_state *st;
-    int (*verdict)(char *, unsigned int);
+    int (*verdict)(const void *, char *, unsigned int);
+    const void *ctx;
     char *reply;
     unsigned int size;
 };
@@ -276,7 +323,7 @@ int stop_own(void *arg) {
     OwnStop *o = static_cast<OwnStop *>(arg);
     HWND hWnd = o->st->hwnd.load();
     if (hWnd == HWND_INVALID) return -1;
-    const int verdict = o->verdict(o->reply, o->size);
+    const int verdict = o->verdict(o->ctx, o->reply, o->size);
     SendMessage(hWnd, MSG_CLOSE, 0, 0);
     return verdict;
 }
@@ -284,10 +331,15 @@ int stop_own(void *arg) {
 }  // namespace
 
 int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void *(*open)(void)) {
+    return mmi_ownwnd_pc_open(st, open_plain, reinterpret_cast<const void *>(open));
+}
+
+int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void (*open)(const void *ctx), const void *ctx) {
     Check_AllTestWnd_Closed();
     st->pcDriven = 0;
     if (st->hwnd.load() == HWND_INVALID) {
-        mmi_RunOnGuiThread(open_own, reinterpret_cast<void *>(open));
+        OwnOpen o{open, ctx};
+        mmi_RunOnGuiThread(open_own, &o);
         for (int i = 0; !st->created.load(); i++) {
             if (i == 30) return 1;
             tp_os_usleep(100000);
@@ -309,7 +361,14 @@ int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void *(*open)(void)) {
 
 int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st, int (*verdict)(char *reply, unsigned int size),
                        char *reply, unsigned int size) {
-    OwnStop o{st, verdict, reply, size};
+    return mmi_ownwnd_pc_stop(st, verdict_plain, reinterpret_cast<const void *>(verdict), reply,
+                              size);
+}
+
+int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st,
+                       int (*verdict)(const void *ctx, char *reply, unsigned int size),
+                       const void *ctx, char *reply, unsigned int size) {
+    OwnStop o{st, verdict, ctx, reply, size};
     const int answer = mmi_RunOnGuiThread(stop_own, &o);
     if (answer >= 0) tp_os_usleep(100000);
     return answer;

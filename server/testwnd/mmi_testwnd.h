@@ -98,6 +98,15 @@ HWND mmi_testwnd_create_full(const char *caption, WNDPROC proc, DWORD addData);
 void mmi_testwnd_create_title(HWND hWnd, const char *titleKey);
 // The 3-pixel green line along the window's top edge.
 void mmi_testwnd_draw_top_line(HDC hdc);
+// The operator's note (noteKey translated) under the title strip, in as many lines as it
+// takes; the y below it.
+int mmi_testwnd_draw_note(HDC hdc, const char *noteKey);
+// A thin rule across the window at y.
+void mmi_testwnd_draw_rule(HDC hdc, int y);
+// One row of a window's list, under a rule at top: its label and its value, green when it
+// passed and red when not; the value ends at valueRight.
+void mmi_testwnd_draw_row(HDC hdc, int top, int height, const char *label, const char *value,
+                          bool passed, int valueRight);
 // The text of a language key, or the key itself when the language file lacks it.
 void mmi_translate(const char *key, char *out, size_t size);
 // Shows the pass label (wParam 5) or only the fail label, and the title in the strip.
@@ -138,10 +147,16 @@ struct mmi_ownwnd_state {
 // window that never comes still answers 1), then the window becomes PC-driven and is sent
 // MSG_ACTIVE (1) and MSG_PAINT unless it has seen them.
 int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void *(*open)(void));
+// The same for windows of a family that share one procedure: open is given ctx.
+int mmi_ownwnd_pc_open(mmi_ownwnd_state *st, void (*open)(const void *ctx), const void *ctx);
 // The PC's close: on the GUI thread, verdict(reply, size) judges the open window, which is
 // then closed; its answer after 100 ms, or -1 when no window was open.
 int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st, int (*verdict)(char *reply, unsigned int size),
                        char *reply, unsigned int size);
+// The same with ctx handed to verdict.
+int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st,
+                       int (*verdict)(const void *ctx, char *reply, unsigned int size),
+                       const void *ctx, char *reply, unsigned int size);
 // MSG_CLOSE's common end: no current test, the flags cleared, the window unregistered and
 // destroyed with its controls.
 void mmi_ownwnd_destroy(mmi_ownwnd_state *st, HWND hWnd);

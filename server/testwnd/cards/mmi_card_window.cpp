@@ -7,7 +7,6 @@
 #include <android/log.h>
 
 #include "core/ftx_config.h"
-#include "mmi_guithread.h"
 #include "mmi_theme.h"
 #include "tp_os.h"
 
@@ -200,27 +199,12 @@ void paint(HWND hWnd, const mmi_cardwnd_desc *d) {
     mmi_testwnd_draw_top_line(hdc);
     SetBkMode(hdc, BM_TRANSPARENT);
     char text[MMI_TESTWND_NOTE_SIZE];
-    mmi_translate(d->noteKey, text, sizeof(text));
-    SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
-    const int noteTop = w / 15 + 10;
-    RECT note = {w / 16, noteTop, w - w / 16, noteTop};
-    DrawText(hdc, text, -1, &note, DT_WORDBREAK | DT_CALCRECT);
-    note.right = w - w / 16;
-    DrawText(hdc, text, -1, &note, DT_WORDBREAK);
     const int rowH = font * 2;
-    int top = note.bottom + font / 2;
-    SetPenColor(hdc, mmi_pixel(MMI_COLOUR_FRAME));
-    SetPenWidth(hdc, 1);
+    int top = mmi_testwnd_draw_note(hdc, d->noteKey) + font / 2;
     for (int i = 0; i < st->lineCount; i++, top += rowH) {
         char label[MMI_TESTWND_TEXT_SIZE], value[MMI_TESTWND_TEXT_SIZE];
         const bool green = line_text(d, st->lines[i], label, value, sizeof label);
-        MoveTo(hdc, 0, top);
-        LineTo(hdc, w, top);
-        SetTextColor(hdc, mmi_pixel(green ? MMI_COLOUR_PASS : MMI_COLOUR_FAIL));
-        RECT rl = {w / 16, top, w * 3 / 8, top + rowH};
-        DrawText(hdc, label, -1, &rl, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
-        RECT rv = {w * 3 / 8 + w / 48, top, w - w / 32, top + rowH};
-        DrawText(hdc, value, -1, &rv, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+        mmi_testwnd_draw_row(hdc, top, rowH, label, value, green, w - w / 32);
     }
     if (st->uid[0]) {
         SetTextColor(hdc, mmi_pixel(MMI_COLOUR_PASS));
@@ -229,8 +213,7 @@ void paint(HWND hWnd, const mmi_cardwnd_desc *d) {
         DrawText(hdc, text, -1, &ru, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
         top += rowH;
     }
-    MoveTo(hdc, 0, top);
-    LineTo(hdc, w, top);
+    mmi_testwnd_draw_rule(hdc, top);
     if (!pc_driven(st)) {
         char word[MMI_TESTWND_TEXT_SIZE];
         mmi_translate("card_TimeLeft", word, sizeof word);
@@ -311,36 +294,25 @@ LRESULT card_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     return DefaultMainWinProc(hWnd, message, wParam, lParam);
 }
 
-struct PcClose {
-    const mmi_cardwnd_desc *d;
-    char *reply;
-    unsigned int size;
-};
-
-int pc_close_on_gui(void *arg) {
-    PcClose *c = static_cast<PcClose *>(arg);
-    mmi_cardwnd_state *st = c->d->state;
-    HWND hWnd = st->wnd.hwnd.load();
-    if (hWnd == HWND_INVALID) return -1;
-    refresh(c->d);
-    if (c->reply != nullptr && c->size > 0) {
+// The PC's verdict, on the GUI thread: "*" and the last report; 1 when every line passed.
+int pc_verdict(const void *ctx, char *reply, unsigned int size) {
+    const mmi_cardwnd_desc *d = static_cast<const mmi_cardwnd_desc *>(ctx);
+    mmi_cardwnd_state *st = d->state;
+    refresh(d);
+    if (reply != nullptr && size > 0) {
         std::lock_guard<std::mutex> lk(st->lock);
-        snprintf(c->reply, c->size, "*%s", st->lastText[0] ? st->lastText : "none");
+        snprintf(reply, size, "*%s", st->lastText[0] ? st->lastText : "none");
     }
     const int answer = all_present(st) ? 1 : 0;
-    CW_DEBUG(c->d, "%s::verdict=%d", __func__, answer);
+    CW_DEBUG(d, "%s::verdict=%d", __func__, answer);
     st->wnd.pcDriven = 0;
     st->byPc = 0;
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
     return answer;
 }
 
-// The window's open, on the GUI thread, for the PC (one PC command at a time).
-const mmi_cardwnd_desc *s_pcOpening = nullptr;
 HWND open_window(const mmi_cardwnd_desc *d);
-void *pc_open_on_gui(void) {
-    open_window(s_pcOpening);
-    return nullptr;
+void pc_open_on_gui(const void *ctx) {
+    open_window(static_cast<const mmi_cardwnd_desc *>(ctx));
 }
 
 }  // namespace
@@ -410,17 +382,12 @@ int mmi_cardwnd_close(const mmi_cardwnd_desc *d) {
 }
 
 int mmi_cardwnd_pc_open(const mmi_cardwnd_desc *d) {
-    s_pcOpening = d;
     d->state->byPc = 1;
-    mmi_ownwnd_pc_open(&d->state->wnd, pc_open_on_gui);
-    s_pcOpening = nullptr;
+    mmi_ownwnd_pc_open(&d->state->wnd, pc_open_on_gui, d);
     if (d->state->wnd.hwnd.load() == HWND_INVALID) d->state->byPc = 0;
     return d->state->wnd.hwnd.load() != HWND_INVALID ? 1 : 0;
 }
 
 int mmi_cardwnd_pc_close(const mmi_cardwnd_desc *d, char *reply, unsigned int size) {
-    PcClose c{d, reply, size};
-    const int answer = mmi_RunOnGuiThread(pc_close_on_gui, &c);
-    if (answer >= 0) tp_os_usleep(100000);
-    return answer;
+    return mmi_ownwnd_pc_stop(&d->state->wnd, pc_verdict, d, reply, size);
 }

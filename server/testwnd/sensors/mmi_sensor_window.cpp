@@ -8,7 +8,6 @@
 #include <android/log.h>
 
 #include "core/ftx_config.h"
-#include "mmi_guithread.h"
 #include "mmi_theme.h"
 #include "tp_os.h"
 
@@ -17,20 +16,8 @@
 
 namespace {
 
-constexpr int kParamsMax = 24;
-
 const mmi_sensorwnd_desc *desc_of(HWND hWnd) {
     return reinterpret_cast<const mmi_sensorwnd_desc *>(GetWindowAdditionalData(hWnd));
-}
-
-// The item's parameter records: its catalogue row's, else its configuration domain's (a
-// family the catalogue does not list).
-int read_params(const mmi_sensorwnd_desc *d, ftx_config_para *p) {
-    int n = mmi_testwnd_params(d->row->domain, p, kParamsMax);
-    if (n > 0) return n;
-    char text[FTX_CFG_TEXT_SIZE] = {0};
-    if (Read_MainCfgFile(d->row->domain, "parameter", text, "") != 0) return 0;
-    return ftx_config_parse_parameter(text, p, kParamsMax);
 }
 
 double param_double(const ftx_config_para *p, int n, const char *key, double def) {
@@ -44,15 +31,13 @@ double param_double(const ftx_config_para *p, int n, const char *key, double def
 
 // The configured lines, with their limits; how many.
 int setup_lines(const mmi_sensorwnd_desc *d) {
-    ftx_config_para p[kParamsMax];
-    const int n = read_params(d, p);
+    ftx_config_para p[MMI_SENSOR_PARAMS_MAX];
+    const int n = mmi_sensorwnd_params(d, p);
     mmi_sensorwnd_state *st = d->state;
     st->lineCount = 0;
     for (int i = 0; i < d->lineCount && st->lineCount < MMI_SENSOR_LINES_MAX; i++) {
         const mmi_sensor_line_spec *s = &d->lines[i];
-        if (s->enableParam != nullptr &&
-            param_double(p, n, s->enableParam, s->offByDefault ? 0 : 1) == 0)
-            continue;
+        if (!mmi_sensorwnd_line_on(p, n, s)) continue;
         const double lo = param_double(p, n, s->loParam, s->loDef);
         const double hi = param_double(p, n, s->hiParam, s->hiDef);
         mmi_sensor_line_reset(&st->lines[st->lineCount++], s, lo, hi);
@@ -166,6 +151,22 @@ void result_text(const mmi_sensor_line &l, char *out, size_t size) {
     }
 }
 
+// The value a line shows: its numbers, its word or its result.
+void value_text(const mmi_sensor_line &l, char *out, size_t size) {
+    if (l.spec->kind == MMI_SENSOR_RESULT) {
+        if (l.seen)
+            result_text(l, out, size);
+        else
+            out[0] = 0;
+    } else if (l.word[0] != 0) {
+        char key[MMI_SENSOR_WORD_SIZE + 8];
+        snprintf(key, sizeof(key), "sensor_%s", l.word);
+        mmi_translate(key, out, size);
+    } else {
+        mmi_sensor_line_value(&l, out, size);
+    }
+}
+
 void paint(HWND hWnd, const mmi_sensorwnd_desc *d) {
     mmi_sensorwnd_state *st = d->state;
     const int w = g_ptScreenInfo.width;
@@ -173,49 +174,22 @@ void paint(HWND hWnd, const mmi_sensorwnd_desc *d) {
     HDC hdc = BeginPaint(hWnd);
     mmi_testwnd_draw_top_line(hdc);
     SetBkMode(hdc, BM_TRANSPARENT);
-    char text[MMI_TESTWND_NOTE_SIZE];
-    mmi_translate(d->noteKey, text, sizeof(text));
-    SetTextColor(hdc, mmi_pixel(MMI_COLOUR_TEXT));
-    const int noteTop = w / 15 + 10;
-    RECT note = {w / 16, noteTop, w - w / 16, noteTop};
-    DrawText(hdc, text, -1, &note, DT_WORDBREAK | DT_CALCRECT);  // as many lines as it takes
-    note.right = w - w / 16;
-    DrawText(hdc, text, -1, &note, DT_WORDBREAK);
     const int rowH = font * 2;
-    int top = note.bottom + font / 2;
-    SetPenColor(hdc, mmi_pixel(MMI_COLOUR_FRAME));
-    SetPenWidth(hdc, 1);
+    int top = mmi_testwnd_draw_note(hdc, d->noteKey) + font / 2;
     for (int i = 0; i < st->lineCount; i++, top += rowH) {
         const mmi_sensor_line &l = st->lines[i];
-        MoveTo(hdc, 0, top);
-        LineTo(hdc, w, top);
-        SetTextColor(hdc, mmi_pixel(l.done ? MMI_COLOUR_PASS : MMI_COLOUR_FAIL));
-        mmi_translate(l.spec->labelKey, text, sizeof(text));
-        RECT label = {w / 16, top, w * 3 / 8, top + rowH};
-        DrawText(hdc, text, -1, &label, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
-        if (l.spec->kind == MMI_SENSOR_RESULT) {
-            if (l.seen)
-                result_text(l, text, sizeof(text));
-            else
-                text[0] = 0;
-        } else if (l.word[0] != 0) {
-            char key[MMI_SENSOR_WORD_SIZE + 8];
-            snprintf(key, sizeof(key), "sensor_%s", l.word);
-            mmi_translate(key, text, sizeof(text));
-        } else {
-            mmi_sensor_line_value(&l, text, sizeof(text));
-        }
-        const bool sides = has_sides(l.spec);
-        RECT value = {w * 3 / 8 + w / 48, top, sides ? w * 11 / 16 : w - w / 32, top + rowH};
-        DrawText(hdc, text, -1, &value, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+        char label[MMI_TESTWND_TEXT_SIZE], value[MMI_TESTWND_TEXT_SIZE];
+        mmi_translate(l.spec->labelKey, label, sizeof(label));
+        value_text(l, value, sizeof(value));
+        mmi_testwnd_draw_row(hdc, top, rowH, label, value, l.done,
+                             has_sides(l.spec) ? w * 11 / 16 : w - w / 32);
         // The side words in the smaller font: two share what is left of the line.
         PLOGFONT lineFont = GetCurFont(hdc);
         if (g_mmiLogFont[4]) SelectFont(hdc, g_mmiLogFont[4]);
         draw_sides(hdc, l, w * 11 / 16, top, top + rowH, w - w / 32);
         if (lineFont) SelectFont(hdc, lineFont);
     }
-    MoveTo(hdc, 0, top);
-    LineTo(hdc, w, top);
+    mmi_testwnd_draw_rule(hdc, top);
     EndPaint(hWnd, hdc);
 }
 
@@ -267,43 +241,42 @@ LRESULT sensor_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     return DefaultMainWinProc(hWnd, message, wParam, lParam);
 }
 
-// The PC's verdict, on the GUI thread.
-struct PcClose {
-    const mmi_sensorwnd_desc *d;
-    char *reply;
-    unsigned int size;
-    int answer;
-};
-
-int pc_close_on_gui(void *arg) {
-    PcClose *c = static_cast<PcClose *>(arg);
-    mmi_sensorwnd_state *st = c->d->state;
-    HWND hWnd = st->wnd.hwnd.load();
-    if (hWnd == HWND_INVALID) return -1;
-    size_t used = 0;
-    if (c->reply != nullptr && c->size > 0) {
-        used = (size_t)snprintf(c->reply, c->size, "*");
-        for (int i = 0; i < st->lineCount && used < c->size; i++) {
-            const int n = snprintf(c->reply + used, c->size - used, "%s%s=%d", i ? ";" : "",
+// The PC's verdict, on the GUI thread: "*" and each line's key=0|1; 1 when all passed.
+int pc_verdict(const void *ctx, char *reply, unsigned int size) {
+    const mmi_sensorwnd_desc *d = static_cast<const mmi_sensorwnd_desc *>(ctx);
+    mmi_sensorwnd_state *st = d->state;
+    if (reply != nullptr && size > 0) {
+        size_t used = (size_t)snprintf(reply, size, "*");
+        for (int i = 0; i < st->lineCount && used < size; i++) {
+            const int n = snprintf(reply + used, size - used, "%s%s=%d", i ? ";" : "",
                                    st->lines[i].spec->key, st->lines[i].done);
             if (n < 0) break;
             used += (size_t)n;
         }
     }
-    const int answer = mmi_sensor_lines_done(st->lines, st->lineCount);
     st->wnd.pcDriven = 0;
-    SendMessage(hWnd, MSG_CLOSE, 0, 0);
-    return answer;
+    return mmi_sensor_lines_done(st->lines, st->lineCount);
 }
 
-// The window's open, on the GUI thread, for the PC.
-const mmi_sensorwnd_desc *s_pcOpening = nullptr;
-void *pc_open_on_gui(void) {
-    mmi_sensorwnd_open(s_pcOpening);
-    return nullptr;
+void pc_open_on_gui(const void *ctx) {
+    mmi_sensorwnd_open(static_cast<const mmi_sensorwnd_desc *>(ctx));
 }
 
 }  // namespace
+
+int mmi_sensorwnd_params(const mmi_sensorwnd_desc *d, ftx_config_para *p) {
+    int n = mmi_testwnd_params(d->row->domain, p, MMI_SENSOR_PARAMS_MAX);
+    if (n > 0) return n;
+    // A family the catalogue does not list keeps its parameter in its domain only.
+    char text[FTX_CFG_TEXT_SIZE] = {0};
+    if (Read_MainCfgFile(d->row->domain, "parameter", text, "") != 0) return 0;
+    return ftx_config_parse_parameter(text, p, MMI_SENSOR_PARAMS_MAX);
+}
+
+bool mmi_sensorwnd_line_on(const ftx_config_para *p, int n, const mmi_sensor_line_spec *s) {
+    return s->enableParam == nullptr ||
+           param_double(p, n, s->enableParam, s->offByDefault ? 0 : 1) != 0;
+}
 
 void mmi_sensorwnd_report(const mmi_sensorwnd_desc *d, const module_data *data) {
     mmi_sensorwnd_state *st = d->state;
@@ -342,17 +315,12 @@ int mmi_sensorwnd_close(const mmi_sensorwnd_desc *d) {
 }
 
 int mmi_sensorwnd_pc_open(const mmi_sensorwnd_desc *d) {
-    // One PC command at a time: the command thread is the only opener of this kind.
-    s_pcOpening = d;
-    mmi_ownwnd_pc_open(&d->state->wnd, pc_open_on_gui);
+    mmi_ownwnd_pc_open(&d->state->wnd, pc_open_on_gui, d);
     return d->state->wnd.hwnd.load() != HWND_INVALID ? 1 : 0;
 }
 
 int mmi_sensorwnd_pc_close(const mmi_sensorwnd_desc *d, char *reply, unsigned int size) {
-    PcClose c{d, reply, size, 0};
-    const int answer = mmi_RunOnGuiThread(pc_close_on_gui, &c);
-    if (answer >= 0) tp_os_usleep(100000);
-    return answer;
+    return mmi_ownwnd_pc_stop(&d->state->wnd, pc_verdict, d, reply, size);
 }
 
 unsigned mmi_sensorwnd_reports(const mmi_sensorwnd_desc *d) {

@@ -50,6 +50,13 @@ struct mmi_sensorwnd_desc {
     int (*stopEntry)(void) = nullptr;
 };
 
+// The item's parameter records of a family (at most MMI_SENSOR_PARAMS_MAX): its catalogue
+// row's, else its configuration domain's. How many.
+#define MMI_SENSOR_PARAMS_MAX 24
+int mmi_sensorwnd_params(const mmi_sensorwnd_desc *d, ftx_config_para *p);
+// Whether those records turn the line on (a line without an enable key always is).
+bool mmi_sensorwnd_line_on(const ftx_config_para *p, int n, const mmi_sensor_line_spec *s);
+
 // What the family's callback does with a report (library thread).
 void mmi_sensorwnd_report(const mmi_sensorwnd_desc *d, const module_data *data);
 

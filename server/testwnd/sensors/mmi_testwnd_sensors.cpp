@@ -141,13 +141,6 @@ int read_field(const char *key, char *reply, unsigned int size) {
     return 1;
 }
 
-// The specs whose sensor the item turns on (as the window would show them).
-bool configured(const mmi_sensor_line_spec &s) {
-    ftx_config_para p[24];
-    const int n = mmi_testwnd_params(kTag, p, 24);
-    return mmi_testwnd_param_int(p, n, s.enableParam, s.offByDefault ? "0" : "1") != 0;
-}
-
 }  // namespace
 
 void sensors_test_callback(module_data *data) {
@@ -181,8 +174,10 @@ int mmi_AutoTest_SensorsTest_Calibrate_Entry(char *reply, unsigned int size) {
     if (reply == nullptr || size == 0) return 0;
     size_t used = (size_t)snprintf(reply, size, "*");
     int all = 1, any = 0;
+    ftx_config_para p[MMI_SENSOR_PARAMS_MAX];
+    const int n = mmi_sensorwnd_params(&kSensors, p);
     for (const mmi_sensor_line_spec &s : kLines) {
-        if (s.calibrate == 0 || !configured(s)) continue;
+        if (s.calibrate == 0 || !mmi_sensorwnd_line_on(p, n, &s)) continue;
         char offsets[FTX_SENSOR_OFFSETS_SIZE] = {0};
         const int rc = hw::ftx_api_Sensors_Calibration
                            ? hw::ftx_api_Sensors_Calibration(s.calibrate, offsets, sizeof(offsets))

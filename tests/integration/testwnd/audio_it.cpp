@@ -11,6 +11,7 @@
 #include <gtest/gtest.h>
 
 #include "support/handset.h"
+#include "support/text.h"
 
 using namespace handset;
 
@@ -76,10 +77,6 @@ int dominant_hz(const std::vector<int16_t> &s) {
         }
     }
     return best;
-}
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
 }
 
 // The status lines of the loopback calls.

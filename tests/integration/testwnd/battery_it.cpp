@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include "support/handset.h"
+#include "support/text.h"
 
 using namespace handset;
 
@@ -24,10 +25,6 @@ template <typename Pred>
 int inLine(const Png &p, int line, Pred pred) {
     const int top = kLinesTop + line * kRowHeight;
     return p.count(0, top, 720, top + kRowHeight, pred);
-}
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
 }
 
 // The image's battery settings with a power-off temperature above what the tests set.

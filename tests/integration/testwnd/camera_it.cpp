@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include "support/handset.h"
+#include "support/text.h"
 
 using namespace handset;
 
@@ -30,10 +31,6 @@ const Cam kCams[] = {
     {"frontcameraMoudle", 1, "Front Camera Test", "FTX_CAMERA_FRONT", 0xFF, 0x8C, 0x00},
     {"auxbackcameraMoudle", 2, "Rear Camera 2 Test", "FTX_AUX_CAMERA_BACK", 0x00, 0x99, 0xCC},
 };
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 // Pixels of the camera's own colour in the box [top, bottom) of p.
 int camColour(const Png &p, const Cam &c, int top = kBoxTop, int bottom = kBoxBottom) {

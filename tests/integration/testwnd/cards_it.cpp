@@ -6,14 +6,11 @@
 #include <gtest/gtest.h>
 
 #include "support/handset.h"
+#include "support/text.h"
 
 using namespace handset;
 
 namespace {
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 std::pair<int, std::string> answer(int result, const std::string &reply) {
     return {result, reply};

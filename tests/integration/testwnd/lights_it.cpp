@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include "support/handset.h"
+#include "support/text.h"
 
 using namespace handset;
 
@@ -18,10 +19,6 @@ const char kEveryLight[] =
     "BackFlashlight:1;SecondBackFlashlight:1;FrontFlashlight:1;LedRed:1;LedGreen:1;LedOrange:1;"
     "KeyBacklight:1";
 const char kAllOff[] = "back=off back2=off front=off led=off keybacklight=off all=off";
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 std::string lights(Handset &h) {
     return h.dut.console("hw lights");

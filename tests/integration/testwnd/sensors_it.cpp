@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include "support/handset.h"
+#include "support/text.h"
 
 using namespace handset;
 
@@ -13,10 +14,6 @@ namespace {
 
 constexpr Item kSensor = {"FTX_SENSOR", 1, 0, 1};
 const char kCaption[] = "Sensor Test";
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 // A run of the sensor item (then the cards) with the image's sensor list.
 struct SensorRun {

@@ -15,6 +15,8 @@
 #include "ftx_host.h"
 #include "hw/lib_factory.h"
 #include "support/temp_root.h"
+#include "support/text.h"
+#include "support/hw_line.h"
 
 namespace {
 
@@ -23,17 +25,6 @@ constexpr int kRate = 16000;
 constexpr size_t kClip = 2 * kRate;
 
 using Samples = std::vector<int16_t>;
-
-std::string hw(const std::string &line, int *rc = nullptr) {
-    char reply[8192];
-    int r = ftx_host_hw_dispatch(line.c_str(), reply, sizeof(reply));
-    if (rc != nullptr) *rc = r;
-    return reply;
-}
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 // A WAV file's bytes: the canonical header, then the samples.
 std::string wav(const Samples &s, int rate = kRate, int channels = 1, int bits = 16) {

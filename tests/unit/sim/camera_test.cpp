@@ -13,20 +13,12 @@
 #include "ftx_host.h"
 #include "hw/lib_factory.h"
 #include "support/temp_root.h"
+#include "support/text.h"
+#include "support/hw_line.h"
 
 namespace {
 
 using ftxsim::camera_pattern;
-
-std::string hw(const std::string &line) {
-    char reply[8192];
-    ftx_host_hw_dispatch(line.c_str(), reply, sizeof(reply));
-    return reply;
-}
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 std::vector<unsigned> frame(int id, long long ms, int w, int h) {
     std::vector<unsigned> f(static_cast<size_t>(w) * h, 0xDEADBEEF);

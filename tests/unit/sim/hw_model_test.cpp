@@ -20,17 +20,11 @@
 #include "hw/lib_factory.h"
 #include "support/temp_root.h"
 #include "unit/config/log_capture.h"
+#include "support/hw_line.h"
 
 namespace {
 
 const bool kFastTime = setenv("FTX_TIME_SCALE", "0.01", 1) == 0;
-
-std::string hw(const std::string &line, int *rc = nullptr) {
-    char reply[8192];
-    int r = ftx_host_hw_dispatch(line.c_str(), reply, sizeof(reply));
-    if (rc != nullptr) *rc = r;
-    return reply;
-}
 
 unsigned char flag_byte(int index) {
     unsigned char flags[FTX_TESTINFO_FLAGS_SIZE];

@@ -17,6 +17,8 @@
 #include "ftx_host.h"
 #include "hw/lib_factory.h"
 #include "support/temp_root.h"
+#include "support/text.h"
+#include "support/hw_line.h"
 
 namespace {
 
@@ -28,17 +30,6 @@ constexpr auto kQuiet = std::chrono::milliseconds(50);
 const char kDefaults[] =
     "acc=0.00,0.00,9.80;mag=20.00,-5.00,40.00;gyro=0.00,0.00,0.00;pressure=1013;proxi=5;"
     "light=120;hr=72;hrself=1";
-
-std::string hw(const std::string &line, int *rc = nullptr) {
-    char reply[8192];
-    int r = ftx_host_hw_dispatch(line.c_str(), reply, sizeof(reply));
-    if (rc != nullptr) *rc = r;
-    return reply;
-}
-
-bool has(const std::string &text, const std::string &part) {
-    return text.find(part) != std::string::npos;
-}
 
 // The sensor area's line of "hw status".
 std::string status_line() {
