@@ -187,21 +187,7 @@ DC *as_dc(HDC hdc) {
     if (hdc == HDC_SCREEN) return g_fb != nullptr ? screen_dc() : nullptr;
     if (hdc == HDC_INVALID) return nullptr;
     DC *dc = static_cast<DC *>(hdc);
-    if (dc->magic != kDcMagic) return nullptr;
-    // A window shown or raised over this one since the DC was made: what it covers is no
-    // longer this window's to draw (a bar painting late must not draw over a window that
-    // came up in front of it meanwhile). Always before the framebuffer lock.
-    const unsigned gen = g_zGen.load();
-    if (dc->win != nullptr && dc->zGen != gen) {
-        std::lock_guard<std::mutex> lk(g_lock);
-        const Window *w = as_window_locked(const_cast<void *>(dc->win));
-        if (w != nullptr) {
-            subtract_covered_locked(w, dc->base);
-            subtract_covered_locked(w, dc->clip);
-        }
-        dc->zGen = gen;
-    }
-    return dc;
+    return dc->magic == kDcMagic ? dc : nullptr;
 }
 
 HDC make_dc(Window *w, bool client, bool) {
@@ -216,7 +202,6 @@ HDC make_dc(Window *w, bool client, bool) {
         dc->oy = r.top;
         dc->win = w;
         visible_region_locked(w, client, dc->base);
-        dc->zGen = g_zGen.load();
         dc->font = w->font != nullptr ? w->font : g_SysLogFont[SYSLOGFONT_DEFAULT];
     }
     dc->clip = dc->base;

@@ -123,11 +123,6 @@ RECT client_screen_rect_locked(const Window *w);
 RECT window_screen_rect_locked(const Window *w);
 // What of the client (or whole window) is visible on screen.
 void visible_region_locked(const Window *w, bool client, Region &out);
-// Takes out of r what the windows above w's main window cover now.
-void subtract_covered_locked(const Window *w, Region &r);
-// Changes whenever a main window is made, raised, shown, hidden, moved or destroyed: a
-// device context made before then narrows itself to what is still uncovered.
-extern std::atomic<unsigned> g_zGen;
 void invalidate_locked(Window *w, const RECT *clientRc, bool erase);
 void wake_locked(MsgQueue *q);
 std::vector<Window *> zorder_snapshot_locked();
@@ -167,9 +162,8 @@ struct DC {
     uint32_t magic = kDcMagic;
     const void *win = nullptr;
     int ox = 0, oy = 0;
-    Region base;        // what of the window is on screen
-    Region clip;        // base narrowed by the program's clip calls
-    unsigned zGen = 0;  // g_zGen when base was last checked
+    Region base;  // what of the window is on screen
+    Region clip;  // base narrowed by the program's clip calls
     gal_pixel bk = 0xFFFFFF, pen = 0, brush = 0xFFFFFF, text = 0;
     int bkMode = BM_OPAQUE;
     Uint32 textAlign = 0;

@@ -101,14 +101,12 @@ HWND CreateMainWindowEx(PMAINWINCREATE p, const char *, const void *, const void
         if (q->root == nullptr) q->root = w;
         g_windows.insert(w);
         g_zorder.push_back(w);
-        g_zGen++;
     }
     SendMessage(w, MSG_NCCREATE, 0, reinterpret_cast<LPARAM>(p));
     if (SendMessage(w, MSG_CREATE, 0, reinterpret_cast<LPARAM>(p)) != 0) {
         DestroyAllControls(w);
         std::lock_guard<std::mutex> lk(g_lock);
         g_zorder.erase(std::remove(g_zorder.begin(), g_zorder.end(), w), g_zorder.end());
-        g_zGen++;
         bury_locked(w);
         return HWND_INVALID;
     }
@@ -144,7 +142,6 @@ BOOL DestroyMainWindow(HWND h) {
         if (g_windows.count(w) == 0) return TRUE;
         bool wasShown = shown(w);
         g_zorder.erase(std::remove(g_zorder.begin(), g_zorder.end(), w), g_zorder.end());
-        g_zGen++;
         for (Window *m : w->queue->mains)
             if (m->host == w) m->host = nullptr;
         bury_locked(w);

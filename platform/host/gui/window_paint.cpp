@@ -59,16 +59,9 @@ void visible_region_locked(const Window *w, bool client, Region &out) {
         out.clear();
         return;
     }
-    subtract_covered_locked(m, out);
-}
-
-void subtract_covered_locked(const Window *w, Region &r) {
-    const Window *m = w;
-    while (m->parent != nullptr)
-        m = m->parent;
     for (Window *z : g_zorder) {
         if (z == m) break;
-        if (shown(z)) r.subtract(z->rc);
+        if (shown(z)) out.subtract(z->rc);
     }
 }
 
