@@ -1,7 +1,7 @@
 // ftx-pc: the test station's client for the handset's command channel.
-//   ftx-pc [-H HOST] [-p PORT] [--root DIR] COMMAND...   sends one command, prints the
-//                               reply; the exit status is the result (0, 2, 3; 1 no connection)
-//   ftx-pc [-H HOST] [-p PORT] [--root DIR]              interactive prompt ("history", "!!")
+//   ftx-pc [-H HOST] [-p PORT] [--root DIR] [-t SECONDS] COMMAND...   sends one command,
+//            prints the reply; the exit status is the result (0, 2, 3; 1 no connection)
+//   ftx-pc [-H HOST] [-p PORT] [--root DIR] [-t SECONDS]   interactive prompt ("history", "!!")
 #include <getopt.h>
 #include <stdio.h>
 #include <stdlib.h>
@@ -19,13 +19,31 @@ namespace {
 
 void usage(FILE *to) {
     fputs(
-        "usage: ftx-pc [-H HOST] [-p PORT] [--root DIR] [COMMAND...]\n"
+        "usage: ftx-pc [-H HOST] [-p PORT] [--root DIR] [-t SECONDS] [COMMAND...]\n"
         "  sends COMMAND (its words joined by blanks), prints the reply and exits with the\n"
         "  result: 0 done, 2 not understood, 3 not possible here, 1 no connection\n"
         "  without a command: an interactive prompt (history, !!, !N, quit)\n"
-        "  the port: -p, else FTX_PC_PORT, else [pc] port of the device root's\n"
-        "  sim/device.ini; the root: --root DIR, else FTX_ROOT, else ./root\n",
+        "  the port: -p, else FTX_PC_PORT, else the port the handset of the device root\n"
+        "  listens on (its run/pc_port), else [pc] port of the root's sim/device.ini;\n"
+        "  the root: --root DIR, else FTX_ROOT, else ./root\n"
+        "  -t: how long to wait for an answer (default 120 s: a board check may take a\n"
+        "  minute)\n",
         to);
+}
+
+// The port the handset of $FTX_ROOT listens on (it writes run/pc_port at start), unless
+// FTX_PC_PORT names one; 0 when neither tells.
+int running_port() {
+    const char *env = getenv("FTX_PC_PORT");
+    const char *root = getenv("FTX_ROOT");
+    if ((env != nullptr && *env != '\0') || root == nullptr) return 0;
+    FILE *fp = fopen((std::string(root) + "/run/pc_port").c_str(), "r");
+    if (fp == nullptr) return 0;
+    char text[32] = {};
+    int port = 0;
+    if (fgets(text, sizeof text, fp) == nullptr || !ftxsim::pc_port_parse(text, &port)) port = 0;
+    fclose(fp);
+    return port;
 }
 
 // The device root whose settings give the port: --root, else FTX_ROOT, else the root
@@ -94,7 +112,7 @@ bool expand(const std::vector<std::string> &history, std::string *line) {
     return true;
 }
 
-int interactive(ftxpc::PcClient &client, const char *host, int port) {
+int interactive(ftxpc::PcClient &client, const char *host, int port, int waitMs) {
     std::vector<std::string> history = load_history();
     bool tty = isatty(0);
     char buf[8192];
@@ -119,10 +137,11 @@ int interactive(ftxpc::PcClient &client, const char *host, int port) {
         history.push_back(line);
         append_history(line);
         std::string reply;
-        int result = client.command(line, &reply);
+        int result = client.command(line, &reply, waitMs);
         if (result < 0) {
             // The handset may have restarted: connect once more and retry.
-            if (client.connect_to(host, port) != 0 || (result = client.command(line, &reply)) < 0) {
+            if (client.connect_to(host, port) != 0 ||
+                (result = client.command(line, &reply, waitMs)) < 0) {
                 printf("connection to %s:%d lost\n", host, port);
                 continue;
             }
@@ -139,11 +158,12 @@ int main(int argc, char **argv) {
     const char *host = "127.0.0.1";
     const char *root = nullptr;
     int port = 0;
+    int waitMs = 120000;
     const option longopts[] = {{"help", no_argument, nullptr, 'h'},
                                {"root", required_argument, nullptr, 'r'},
                                {nullptr, 0, nullptr, 0}};
     int opt;
-    while ((opt = getopt_long(argc, argv, "+H:p:h", longopts, nullptr)) != -1) {
+    while ((opt = getopt_long(argc, argv, "+H:p:t:h", longopts, nullptr)) != -1) {
         switch (opt) {
             case 'H':
                 host = optarg;
@@ -157,6 +177,17 @@ int main(int argc, char **argv) {
             case 'r':
                 root = optarg;
                 break;
+            case 't': {
+                char *end = nullptr;
+                const long seconds = strtol(optarg, &end, 10);
+                if (end == optarg || *end != '\0' || seconds < 1 || seconds > 86400) {
+                    fprintf(stderr, "ftx-pc: -t %s: the wait is a number of seconds 1..86400\n",
+                            optarg);
+                    return 1;
+                }
+                waitMs = static_cast<int>(seconds * 1000);
+                break;
+            }
             case 'h':
                 usage(stdout);
                 return 0;
@@ -167,6 +198,9 @@ int main(int argc, char **argv) {
     }
     if (port == 0) {
         choose_root(root);
+        port = running_port();
+    }
+    if (port == 0) {
         ftxsim::PcPortSetting s = ftxsim::pc_port_setting();
         if (!s.ok || s.port == 0) {
             fprintf(stderr, "ftx-pc: %s \"%s\" is not a port number (1..65535)\n", s.source,
@@ -185,16 +219,16 @@ int main(int argc, char **argv) {
         fprintf(stderr, "ftx-pc: cannot connect to %s:%d\n", host, port);
         return 1;
     }
-    if (optind >= argc) return interactive(client, host, port);
+    if (optind >= argc) return interactive(client, host, port, waitMs);
     std::string line;
     for (int i = optind; i < argc; ++i) {
         if (!line.empty()) line += ' ';
         line += argv[i];
     }
     std::string reply;
-    int result = client.command(line, &reply);
+    int result = client.command(line, &reply, waitMs);
     if (result < 0) {
-        fprintf(stderr, "ftx-pc: no answer from %s:%d\n", host, port);
+        fprintf(stderr, "ftx-pc: no answer from %s:%d within %d s\n", host, port, waitMs / 1000);
         return 1;
     }
     print_reply(reply);

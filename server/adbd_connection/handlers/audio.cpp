@@ -6,7 +6,6 @@
 
 #include "adbd_connection/handlers/common.h"
 #include "adbd_connection/handlers/handlers.h"
-#include "core/mmi_loglevel.h"
 #include "testwnd/audio/mmi_testwnd_fm.h"
 #include "testwnd/audio/mmi_testwnd_loopback.h"
 #include "testwnd/audio/mmi_testwnd_mainmic.h"
@@ -50,12 +49,8 @@ const int kLoopCount = (int)(sizeof(kLoops) / sizeof(kLoops[0]));
 // The loop the last start stored; only the command thread touches it.
 int s_audioLoop = -1;
 
-void log_parm(const char *name, const char *parm) {
-    MMI_LOGD(AT_TAG, "%s begin,bufIn=%s", name, parm != nullptr ? parm : "");
-}
-
 int start_loop(const char *name, int loop, const char *parm, int parmLen) {
-    log_parm(name, parm);
+    at_log_parm(name, parm);
     s_audioLoop = loop;
     if (kLoops[loop].start == nullptr) return 0;
     return kLoops[loop].start(parm, parmLen);
@@ -88,13 +83,13 @@ int AutoTest_audioloop_Stop(const char *, int, char *, unsigned int) {
 
 // Starts the headset-to-upper-speaker loop, yet its close is the headset-receiver loop's.
 int AutoTestMicToSpeakerStart(const char *parm, int parmLen, char *, unsigned int) {
-    log_parm(__func__, parm);
+    at_log_parm(__func__, parm);
     s_audioLoop = 2;
     return mmi_AutoTest_Audio_Headset_UpSpeaker_LoopBackTestEntry(parm, parmLen);
 }
 
 int AutoTest_FM_Start(const char *parm, int, char *, unsigned int) {
-    log_parm(__func__, parm);
+    at_log_parm(__func__, parm);
     return mmi_AutoTest_FMTest_Entry(parm != nullptr ? atoi(parm) : 0);
 }
 
@@ -104,7 +99,7 @@ int AutoTest_FM_Stop(const char *, int, char *, unsigned int) {
 }
 
 int AutoTest_hifi_Start(const char *parm, int, char *, unsigned int) {
-    log_parm(__func__, parm);
+    at_log_parm(__func__, parm);
     return mmi_AutoTest_HiFiTestEntry(parm);
 }
 
@@ -114,7 +109,7 @@ int AutoTest_hifi_Stop(const char *, int, char *, unsigned int) {
 }
 
 int AutoTest_Ring_Start(const char *parm, int, char *, unsigned int) {
-    log_parm(__func__, parm);
+    at_log_parm(__func__, parm);
     return mmi_auto_RingtoneTest(parm);
 }
 

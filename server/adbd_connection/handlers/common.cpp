@@ -10,6 +10,10 @@ void at_log_begin(const char *name) {
     MMI_LOGD(AT_TAG, "%s begin", name);
 }
 
+void at_log_parm(const char *name, const char *parm) {
+    MMI_LOGD(AT_TAG, "%s begin,bufIn=%s", name, parm != nullptr ? parm : "");
+}
+
 int at_run_shell(const char *name, const char *line) {
     at_log_begin(name);
     dev_system(line);

@@ -146,14 +146,18 @@ void start_camera(HWND hWnd, const Camera &c) {
     SetTimer(hWnd, kPreviewTimer, kPreviewPeriod);
 }
 
+void make_picture_dir(const Camera &c) {
+    if (dev_mkdir(kPictureDir, 0755) != 0 && errno != EEXIST)
+        CAM_ERROR(c, "cannot make %s: %s", kPictureDir, strerror(errno));
+}
+
 // Saves a picture of the started camera; 0 and its device path, else -1.
 int snapshot(HWND hWnd, const Camera &c, char *path, size_t size) {
     if (!c.state->started.load()) {
         CAM_ERROR(c, "%s::camera not started", __func__);
         return -1;
     }
-    if (dev_mkdir(kPictureDir, 0755) != 0 && errno != EEXIST)
-        CAM_ERROR(c, "%s::cannot make %s: %s", __func__, kPictureDir, strerror(errno));
+    make_picture_dir(c);
     snprintf(path, size, "%s/%s_%u.png", kPictureDir, c.fileName, ++c.state->shots);
     if (hw::ftx_api_camera_do_autofocus) {
         const int af = hw::ftx_api_camera_do_autofocus(c.id);
@@ -367,6 +371,37 @@ void mmi_camera_layout_for(int w, int h, int lineHeight, mmi_camera_layout *out)
     const int left = (w - bw) / 2;
     out->preview = {left, top, left + bw, top + bh};
     out->status = {0, top + bh + margin, w, top + bh + margin + lineHeight};
+}
+
+int mmi_camera_check(int camera, char *out, unsigned int size) {
+    const Camera *found = nullptr;
+    for (const Camera &c : kCameras)
+        if (c.id == camera) found = &c;
+    if (found == nullptr || out == nullptr || size == 0) return -1;
+    const Camera &c = *found;
+    if (c.state->started.load()) {
+        // Its window holds it: a second start would fail for a reason of ours, not the board's.
+        snprintf(out, size, "camera %d is in use: fail", camera);
+        return -1;
+    }
+    int rc = hw::ftx_api_camera_test_start ? hw::ftx_api_camera_test_start(camera) : -1;
+    CAM_DEBUG(c, "%s::ftx_api_camera_test_start(%d) ret=%d", __func__, camera, rc);
+    if (rc != 0) {
+        snprintf(out, size, "camera %d did not start: fail", camera);
+        return -1;
+    }
+    make_picture_dir(c);
+    char path[kPathSize];
+    snprintf(path, sizeof path, "%s/pcba_%s.png", kPictureDir, c.fileName);
+    rc = hw::ftx_api_camera_start_capture ? hw::ftx_api_camera_start_capture(camera, path) : -1;
+    CAM_DEBUG(c, "%s::capture %s ret=%d", __func__, path, rc);
+    if (hw::ftx_api_camera_test_stop) hw::ftx_api_camera_test_stop(camera);
+    if (rc != 0) {
+        snprintf(out, size, "camera %d started, no picture: fail", camera);
+        return -1;
+    }
+    snprintf(out, size, "camera %d took %s: success", camera, path);
+    return 0;
 }
 
 #define MMI_CAMERA_ENTRIES(Name, K)                                                  \

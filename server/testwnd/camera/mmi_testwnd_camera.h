@@ -23,6 +23,11 @@ int mmi_AutoTest_CameraBackTest_Snapshot_Entry(char *reply, unsigned int size);
 int mmi_AutoTest_CameraAuxBackTest_Snapshot_Entry(char *reply, unsigned int size);
 int mmi_AutoTest_CameraFrontTest_Snapshot_Entry(char *reply, unsigned int size);
 
+// A camera's board check without a window (the PCBA run): the camera (FTX_CAMERA_...)
+// started, one picture taken to /data/ftx_camera/pcba_<camera>.png, the camera stopped.
+// out gets what happened, ending in "success" when every step went well; 0 then, else -1.
+int mmi_camera_check(int camera, char *out, unsigned int size);
+
 // Where the window draws, in a client area of w x h with text lines lineHeight high: the
 // note line at the top, the largest upright 3:4 preview box centred below it, and the
 // snapshot's status line under the box.

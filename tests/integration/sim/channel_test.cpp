@@ -167,7 +167,8 @@ TEST_F(Channel, PcToolExitStatusIsTheResult) {
     EXPECT_NE(out.find("no such history entry"), std::string::npos) << out;
 }
 
-// --root DIR takes the port from DIR/sim/device.ini unless FTX_PC_PORT is set.
+// --root DIR takes the port its handset runs on, else DIR/sim/device.ini's, unless
+// FTX_PC_PORT is set.
 TEST_F(Channel, PcToolFindsThePortOfTheRootItIsGiven) {
     std::string other = root_.path() + "/other";
     std::filesystem::create_directories(other + "/sim");
@@ -191,6 +192,21 @@ TEST_F(Channel, PcToolFindsThePortOfTheRootItIsGiven) {
     std::string err = run("env -u FTX_PC_PORT " + pc + " --root /nonexistent echo x 2>&1", &status);
     EXPECT_EQ(status, 1);
     EXPECT_NE(err.find("no [pc] port in /nonexistent/sim/device.ini"), std::string::npos) << err;
+    // A handset started on another port than its root's setting says which in run/pc_port.
+    std::string running = root_.path() + "/running";
+    std::filesystem::create_directories(running + "/sim");
+    std::filesystem::create_directories(running + "/run");
+    ini = fopen((running + "/sim/device.ini").c_str(), "w");
+    ASSERT_NE(ini, nullptr);
+    fprintf(ini, "[pc]\nport=1\n");
+    fclose(ini);
+    FILE *now = fopen((running + "/run/pc_port").c_str(), "w");
+    ASSERT_NE(now, nullptr);
+    fprintf(now, "%d\n", port_);
+    fclose(now);
+    EXPECT_EQ(run("env -u FTX_PC_PORT " + pc + " --root " + running + " echo running", &status),
+              "running\n");
+    EXPECT_EQ(status, 0);
     err = run("FTX_PC_PORT=100231 " + pc + " echo x 2>&1", &status);
     EXPECT_EQ(status, 1);
     EXPECT_NE(err.find("FTX_PC_PORT \"100231\" is not a port number"), std::string::npos) << err;
