@@ -251,7 +251,7 @@ BOOL FillBoxWithBitmap(HDC hdc, int x, int y, int w, int h, const BITMAP *bmp) {
     bool key = (bmp->bmType & BMP_TYPE_COLORKEY) != 0;
     bool mask = (bmp->bmType & BMP_TYPE_ALPHA_MASK) != 0 && bmp->bmAlphaMask != nullptr;
     int global = (bmp->bmType & BMP_TYPE_ALPHACHANNEL) != 0 ? bmp->bmAlpha : 255;
-    std::lock_guard<std::mutex> fb(g_fbLock);
+    DcDraw fb(dc);
     for (const RECT &c : dc->clip.rects) {
         RECT r;
         if (!IntersectRect(&r, &c, &dst)) continue;
@@ -276,7 +276,6 @@ BOOL FillBoxWithBitmap(HDC hdc, int x, int y, int w, int h, const BITMAP *bmp) {
             }
         }
     }
-    g_fbSerial++;
     return TRUE;
 }
 

@@ -224,12 +224,12 @@ int run_width(const DC *dc, const Ch *chars, size_t n) {
 }
 
 // Draws one line with its top-left at (x, y) in screen coordinates; returns its width.
-int draw_run(const DC *dc, int x, int y, const Ch *chars, size_t n) {
+int draw_run(DC *dc, int x, int y, const Ch *chars, size_t n) {
     int size = font_size(dc->font);
     bool bold = font_bold(dc->font);
     int ascent = dc->font != nullptr ? dc->font->ascent : size * 7 / 8;
     int width = run_width(dc, chars, n);
-    std::lock_guard<std::mutex> fb(g_fbLock);
+    DcDraw fb(dc);
     if (dc->bkMode == BM_OPAQUE) px_fill(dc, RECT{x, y, x + width, y + size}, dc->bk);
     RECT clipBox = dc->clip.bounds();
     int pen = x;
@@ -249,7 +249,6 @@ int draw_run(const DC *dc, int x, int y, const Ch *chars, size_t n) {
         }
         pen += g.adv + dc->charExtra;
     }
-    g_fbSerial++;
     return width;
 }
 
@@ -556,6 +555,7 @@ int DrawTextEx2(HDC hdc, const char *text, int count, RECT *rc, int indent, UINT
         y += lineH;
     }
     dc->clip = saved;
+    dc->clip.intersect(dc->base);  // drawing may have found less of the window visible
     return total;
 }
 

@@ -27,6 +27,16 @@ void Region::intersect(const RECT &rc) {
     rects.swap(out);
 }
 
+void Region::intersect(const Region &r) {
+    std::vector<RECT> out;
+    for (const RECT &a : rects)
+        for (const RECT &b : r.rects) {
+            RECT i;
+            if (IntersectRect(&i, &a, &b)) out.push_back(i);
+        }
+    rects.swap(out);
+}
+
 void Region::subtract(const RECT &cut) {
     std::vector<RECT> out;
     for (const RECT &r : rects) {
@@ -173,15 +183,30 @@ void line_screen(DC *dc, int x0, int y0, int x1, int y1) {
     }
 }
 
-struct FbGuard {
-    FbGuard() { g_fbLock.lock(); }
-    ~FbGuard() {
-        g_fbSerial++;
-        g_fbLock.unlock();
-    }
-};
-
 }  // namespace
+
+DcDraw::DcDraw(DC *dc) {
+    g_fbLock.lock();
+    // Until the window system stayed still between the narrowing and the lock.
+    while (dc->win != nullptr && dc->zGen != g_zGen.load()) {
+        // The window system's lock comes before the framebuffer's.
+        g_fbLock.unlock();
+        {
+            std::lock_guard<std::mutex> lk(g_lock);
+            Region now;  // empty once the window is gone
+            if (alive_locked(dc->win)) visible_region_locked(dc->win, dc->client, now);
+            dc->base.intersect(now);
+            dc->clip.intersect(now);
+            dc->zGen = g_zGen.load();
+        }
+        g_fbLock.lock();
+    }
+}
+
+DcDraw::~DcDraw() {
+    g_fbSerial++;
+    g_fbLock.unlock();
+}
 
 DC *as_dc(HDC hdc) {
     if (hdc == HDC_SCREEN) return g_fb != nullptr ? screen_dc() : nullptr;
@@ -201,6 +226,8 @@ HDC make_dc(Window *w, bool client, bool) {
         dc->ox = r.left;
         dc->oy = r.top;
         dc->win = w;
+        dc->client = client;
+        dc->zGen = g_zGen.load();
         visible_region_locked(w, client, dc->base);
         dc->font = w->font != nullptr ? w->font : g_SysLogFont[SYSLOGFONT_DEFAULT];
     }
@@ -229,7 +256,7 @@ void draw_border(Window *w) {
         r = window_screen_rect_locked(w);
     }
     {
-        FbGuard fb;
+        DcDraw fb(dc);
         draw_frame_screen(dc->clip, r, SysPixelIndex[20]);
     }
     free_dc(hdc);
@@ -422,7 +449,7 @@ gal_pixel GetPixel(HDC hdc, int x, int y) {
 gal_pixel SetPixel(HDC hdc, int x, int y, gal_pixel px) {
     DC *dc = as_dc(hdc);
     if (dc == nullptr) return 0;
-    FbGuard fb;
+    DcDraw fb(dc);
     px_blend(dc, x + dc->ox, y + dc->oy, px, 255);
     return px;
 }
@@ -482,7 +509,7 @@ void LineTo(HDC hdc, int x, int y) {
     DC *dc = as_dc(hdc);
     if (dc == nullptr) return;
     {
-        FbGuard fb;
+        DcDraw fb(dc);
         line_screen(dc, dc->pos.x + dc->ox, dc->pos.y + dc->oy, x + dc->ox, y + dc->oy);
     }
     dc->pos = POINT{x, y};
@@ -505,7 +532,7 @@ void Rectangle(HDC hdc, int x0, int y0, int x1, int y1) {
     if (dc == nullptr) return;
     int l = std::min(x0, x1) + dc->ox, r = std::max(x0, x1) + dc->ox;
     int t = std::min(y0, y1) + dc->oy, b = std::max(y0, y1) + dc->oy;
-    FbGuard fb;
+    DcDraw fb(dc);
     line_screen(dc, l, t, r, t);
     line_screen(dc, l, b, r, b);
     line_screen(dc, l, t, l, b);
@@ -515,7 +542,7 @@ void Rectangle(HDC hdc, int x0, int y0, int x1, int y1) {
 void FillBox(HDC hdc, int x, int y, int w, int h) {
     DC *dc = as_dc(hdc);
     if (dc == nullptr || w <= 0 || h <= 0) return;
-    FbGuard fb;
+    DcDraw fb(dc);
     px_fill(dc, RECT{x + dc->ox, y + dc->oy, x + dc->ox + w, y + dc->oy + h}, dc->brush);
 }
 
@@ -524,7 +551,7 @@ void Circle(HDC hdc, int sx, int sy, int r) {
     if (dc == nullptr || r < 0) return;
     sx += dc->ox;
     sy += dc->oy;
-    FbGuard fb;
+    DcDraw fb(dc);
     int x = r, y = 0, err = 1 - r;
     while (x >= y) {
         const int pts[8][2] = {{x, y},   {y, x},   {-y, x}, {-x, y},
@@ -546,7 +573,7 @@ void FillCircle(HDC hdc, int sx, int sy, int r) {
     if (dc == nullptr || r < 0) return;
     sx += dc->ox;
     sy += dc->oy;
-    FbGuard fb;
+    DcDraw fb(dc);
     for (int dy = -r; dy <= r; dy++) {
         int dx = static_cast<int>(sqrt(static_cast<double>(r) * r - static_cast<double>(dy) * dy));
         px_fill(dc, RECT{sx - dx, sy + dy, sx + dx + 1, sy + dy + 1}, dc->brush);
@@ -565,7 +592,7 @@ BOOL FillPolygon(HDC hdc, const POINT *pts, int n) {
     top = std::max(top, b.top - dc->oy);
     bottom = std::min(bottom, b.bottom - dc->oy);
     std::vector<double> xs;
-    FbGuard fb;
+    DcDraw fb(dc);
     // Scan lines through pixel centres, even-odd rule; the outline itself is filled too.
     for (int y = top; y <= bottom; y++) {
         xs.clear();

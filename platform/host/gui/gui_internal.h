@@ -26,6 +26,7 @@ struct Region {
     void clear() { rects.clear(); }
     bool empty() const { return rects.empty(); }
     void intersect(const RECT &rc);
+    void intersect(const Region &r);
     void subtract(const RECT &rc);
     void unite(const RECT &rc);  // rc is added without overlapping what is there
     bool contains(int x, int y) const;
@@ -123,6 +124,10 @@ RECT client_screen_rect_locked(const Window *w);
 RECT window_screen_rect_locked(const Window *w);
 // What of the client (or whole window) is visible on screen.
 void visible_region_locked(const Window *w, bool client, Region &out);
+// Bumped under g_lock whenever a window is shown, hidden, raised, moved or destroyed: a
+// device context made before then checks what of its window is still visible before it
+// draws again (DcDraw).
+extern std::atomic<unsigned> g_zGen;
 void invalidate_locked(Window *w, const RECT *clientRc, bool erase);
 void wake_locked(MsgQueue *q);
 std::vector<Window *> zorder_snapshot_locked();
@@ -160,10 +165,12 @@ int aux_screenshot(const char *path);
 constexpr uint32_t kDcMagic = 0x4844430A;
 struct DC {
     uint32_t magic = kDcMagic;
-    const void *win = nullptr;
+    Window *win = nullptr;
+    bool client = true;  // of the client area, not the whole window
     int ox = 0, oy = 0;
-    Region base;  // what of the window is on screen
-    Region clip;  // base narrowed by the program's clip calls
+    Region base;        // what of the window is on screen
+    Region clip;        // base narrowed by the program's clip calls
+    unsigned zGen = 0;  // g_zGen when base was last checked
     gal_pixel bk = 0xFFFFFF, pen = 0, brush = 0xFFFFFF, text = 0;
     int bkMode = BM_OPAQUE;
     Uint32 textAlign = 0;
@@ -175,6 +182,18 @@ struct DC {
     PLOGFONT font = nullptr;
 };
 DC *as_dc(HDC hdc);
+// Holds the framebuffer while drawing through a DC. A DC lives across other threads'
+// work: a bar's paint may begin before a window comes up over the bar and draw after that
+// window painted. So whenever the windows changed since the DC last looked, what of its
+// window is no longer visible is first taken out of its region. The look is made with the
+// framebuffer held: a window that comes up after it paints after this drawing, over it.
+class DcDraw {
+  public:
+    explicit DcDraw(DC *dc);
+    ~DcDraw();  // the picture changed
+    DcDraw(const DcDraw &) = delete;
+    DcDraw &operator=(const DcDraw &) = delete;
+};
 // Pixel writers; the caller holds g_fbLock. Coordinates are on screen.
 void px_fill(const DC *dc, RECT rc, gal_pixel px);
 void px_blend(const DC *dc, int x, int y, gal_pixel px, int alpha);

@@ -16,6 +16,7 @@ std::unordered_set<Window *> &g_windows = *new std::unordered_set<Window *>;  //
 std::unordered_set<Window *> &g_zombies =
     *new std::unordered_set<Window *>;  // destroyed, memory kept until the queue's clean-up
 std::vector<Window *> &g_zorder = *new std::vector<Window *>;  // main windows, top first
+std::atomic<unsigned> g_zGen{0};
 std::vector<MsgQueue *> &g_queues = *new std::vector<MsgQueue *>;
 Window *g_active = nullptr;
 Window *g_capture = nullptr;

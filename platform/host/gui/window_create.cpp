@@ -16,6 +16,7 @@ void kill_timers_locked(Window *w) {
 // Forgets a destroyed window: no longer live, memory kept until the queue goes.
 void bury_locked(Window *w) {
     w->destroyed = true;
+    g_zGen++;
     kill_timers_locked(w);
     g_windows.erase(w);
     g_zombies.insert(w);

@@ -17,6 +17,7 @@ void raise_locked(Window *w) {
             pos++;
     }
     g_zorder.insert(g_zorder.begin() + static_cast<long>(pos), w);
+    g_zGen++;
 }
 
 void notify_active(Window *w, BOOL on) {
@@ -101,6 +102,7 @@ BOOL ShowWindow(HWND h, int cmd) {
         Window *w = as_window_locked(h);
         if (w == nullptr) return FALSE;
         bool was = (w->style & WS_VISIBLE) != 0;
+        g_zGen++;
         if (cmd == SW_HIDE) {
             if (!was) return TRUE;
             w->style &= ~static_cast<DWORD>(WS_VISIBLE);
@@ -142,6 +144,7 @@ BOOL MoveWindow(HWND h, int x, int y, int w, int hgt, BOOL fPaint) {
     RECT old = window_screen_rect_locked(win);
     RECT oldRel = win->rc;
     win->rc = RECT{x, y, x + std::max(w, 0), y + std::max(hgt, 0)};
+    g_zGen++;
     if (win->isMain) {
         if (shown(win)) expose_locked(old, win);
     } else if (win->parent != nullptr) {

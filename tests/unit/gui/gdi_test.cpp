@@ -280,3 +280,35 @@ TEST(Gdi, TruncatedOrForeignPictureIsRefused) {
         LoadBitmapFromMem(HDC_SCREEN, &b, bmp.data(), static_cast<int>(bmp.size()) - 3, "bmp"), 0);
     EXPECT_LT(LoadBitmapFromMem(HDC_SCREEN, &b, "GIF89a", 6, "gif"), 0);
 }
+
+TEST(Gdi, ADeviceContextKeepsOffAWindowThatCameUpOverItsWindowAfterItWasTaken) {
+    // A bar's paint that began before a window came up over the bar ends after that window
+    // painted: shapes, text and pictures drawn then stay off it, and still reach the part
+    // of the bar it leaves uncovered.
+    GuiThread bar(RECT{0, 0, kW, 60}, "bar");
+    ASSERT_TRUE(idle());
+    HDC hdc = HDC_INVALID;
+    bar.run([&] { hdc = GetClientDC(bar.hwnd()); });
+    GuiThread front(RECT{0, 0, kW / 2, kH}, "front");
+    ASSERT_TRUE(idle());
+    ASSERT_EQ(count_not(RECT{0, 0, kW / 2, kH}, kBlack), 0);
+    const std::string bmp = make_bmp(4, 2, kRed, kRed);
+    bar.run([&] {
+        SetBrushColor(hdc, kRed);
+        FillBox(hdc, 0, 0, kW, 20);
+        SetBkMode(hdc, BM_OPAQUE);
+        SetBkColor(hdc, kRed);
+        SetTextColor(hdc, kRed);
+        TextOut(hdc, 0, 20, std::string(80, 'W').c_str());
+        BITMAP b;
+        if (LoadBitmapFromMem(hdc, &b, bmp.data(), static_cast<int>(bmp.size()), "bmp") == 0) {
+            FillBoxWithBitmap(hdc, 0, 40, kW, 20, &b);
+            UnloadBitmap(&b);
+        }
+        ReleaseDC(hdc);
+    });
+    EXPECT_EQ(count_not(RECT{0, 0, kW / 2, kH}, kBlack), 0) << "the window in front is untouched";
+    EXPECT_EQ(count_not(RECT{kW / 2, 0, kW, 20}, kRed), 0) << "the box";
+    EXPECT_LT(count_not(RECT{kW / 2, 20, kW, 40}, kRed), (kW / 2) * 20) << "the text";
+    EXPECT_EQ(count_not(RECT{kW / 2, 40, kW, 60}, kRed), 0) << "the picture";
+}
