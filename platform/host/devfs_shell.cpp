@@ -11,6 +11,7 @@
 #include <unistd.h>
 
 #include <atomic>
+#include <map>
 #include <mutex>
 #include <string>
 #include <vector>
@@ -77,15 +78,20 @@ extern "C" int ftx_shell_prepare(const char *line, char *out, size_t size) {
     return rc;
 }
 
-extern "C" int dev_system(const char *cmd) {
-    if (cmd == nullptr) return 1;  // a shell is available
+namespace {
+
+// Checks, records and starts a device shell line; with childFd >= 0 that descriptor becomes
+// the shell's targetFd. The shell's pid, or -1 (*refused tells whether the line was refused).
+pid_t start_line(const char *cmd, int childFd, int targetFd, bool *refused) {
+    *refused = false;
     record(cmd);
     std::string line, why;
     if (ftxhost::shell_prepare(cmd, shell_context(), &line, &why) != 0) {
         record("refused: " + why);
         __android_log_print(ANDROID_LOG_ERROR, "PLATFORM", "dev_system: refused \"%s\": %s", cmd,
                             why.c_str());
-        return W_EXITCODE(127, 0);
+        *refused = true;
+        return -1;
     }
     std::string root = dev_root();
     std::vector<std::string> env;
@@ -108,6 +114,7 @@ extern "C" int dev_system(const char *cmd) {
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
     posix_spawn_file_actions_addchdir_np(&actions, root.c_str());
+    if (childFd >= 0) posix_spawn_file_actions_adddup2(&actions, childFd, targetFd);
     const char *argv[] = {"sh", "-c", line.c_str(), nullptr};
     pid_t pid;
     int rc =
@@ -117,11 +124,70 @@ extern "C" int dev_system(const char *cmd) {
         errno = rc;
         return -1;
     }
+    return pid;
+}
+
+int wait_line(pid_t pid) {
     int status = 0;
     while (waitpid(pid, &status, 0) < 0) {
         if (errno != EINTR) return -1;
     }
     return status;
+}
+
+// The shells behind the streams dev_popen handed out.
+std::mutex g_streamsLock;
+std::map<FILE *, pid_t> g_streams;
+
+}  // namespace
+
+extern "C" int dev_system(const char *cmd) {
+    if (cmd == nullptr) return 1;  // a shell is available
+    bool refused = false;
+    pid_t pid = start_line(cmd, -1, -1, &refused);
+    if (refused) return W_EXITCODE(127, 0);
+    return pid < 0 ? -1 : wait_line(pid);
+}
+
+extern "C" FILE *dev_popen(const char *cmd, const char *mode) {
+    if (cmd == nullptr || mode == nullptr || (mode[0] != 'r' && mode[0] != 'w')) {
+        errno = EINVAL;
+        return nullptr;
+    }
+    const bool reading = mode[0] == 'r';
+    int fds[2];
+    if (pipe2(fds, O_CLOEXEC) != 0) return nullptr;
+    // The shell gets the pipe's writing end as its output, or its reading end as its input.
+    const int mine = reading ? fds[0] : fds[1], theirs = reading ? fds[1] : fds[0];
+    bool refused = false;
+    pid_t pid = start_line(cmd, theirs, reading ? STDOUT_FILENO : STDIN_FILENO, &refused);
+    close(theirs);
+    FILE *fp = pid < 0 ? nullptr : fdopen(mine, reading ? "r" : "w");
+    if (fp == nullptr) {
+        close(mine);
+        if (pid >= 0) wait_line(pid);
+        if (refused) errno = EPERM;
+        return nullptr;
+    }
+    std::lock_guard<std::mutex> lock(g_streamsLock);
+    g_streams[fp] = pid;
+    return fp;
+}
+
+extern "C" int dev_pclose(FILE *fp) {
+    pid_t pid;
+    {
+        std::lock_guard<std::mutex> lock(g_streamsLock);
+        auto it = g_streams.find(fp);
+        if (it == g_streams.end()) {
+            errno = ECHILD;
+            return -1;
+        }
+        pid = it->second;
+        g_streams.erase(it);
+    }
+    fclose(fp);
+    return wait_line(pid);
 }
 
 extern "C" void ftx_set_reboot_hook(ftx_reboot_hook_fn fn) {

@@ -54,6 +54,26 @@ int dev_mount(const char *source, const char *target, const char *fstype, unsign
 /* The host name of a handset network interface ("wlan0" -> "lo" by default). */
 const char *dev_ifname(const char *name);
 
+/* Runs a device shell line (checked and rewritten as dev_system does) with its standard
+ * output (mode "r") or input ("w") on the returned stream; dev_pclose gives the wait status.
+ * NULL when the line is refused or cannot run. */
+FILE *dev_popen(const char *cmd, const char *mode);
+int dev_pclose(FILE *fp);
+
+/* The IPv4 address of a handset network interface as dotted text (the SIOCGIFADDR answer):
+ * 0, or -1 when the interface has none. On the host, "wlan0" answers the simulated Wi-Fi
+ * network's address once its DHCP step handed one out, until the link or the interface
+ * goes down. */
+int dev_if_ipv4(const char *name, char *out, size_t size);
+/* The hardware address of a handset network interface (the SIOCGIFHWADDR answer): 0, or -1. */
+int dev_if_hwaddr(const char *name, unsigned char mac[6]);
+
+/* The host address a handset service binds for interface name (sockaddr_in, network order)
+ * and the host port for its device port: on a handset the interface's own address and the
+ * same port; on the host the mapped interface's address and the port sim/device.ini moves
+ * it to ([ports] udp_3536=N), so that several handsets can run side by side. 0, or -1. */
+int dev_service_addr(const char *name, int port, void *sockaddr_in_out);
+
 #ifdef __cplusplus
 }
 #endif

@@ -10,10 +10,6 @@
 #include "adbd_connection/handlers/handlers.h"
 #include "mmi_dialog.h"
 
-// A row whose handler arrives with its test; the name says which (it must be declared, and
-// must not be defined yet: a test holds the table to both).
-#define PENDING(handler) ((void)sizeof(&handler), nullptr)
-
 const AtCmdRow g_atcmd_table[AT_CMD_TABLE_ROWS] = {
     /*   1 */ {"vibratorMoudle testItem null", "", AutoTest_Vibrator_Start},
     /*   2 */ {"vibratorMoudle testItem open", "", AutoTest_Vibrator_Start},
@@ -126,8 +122,8 @@ const AtCmdRow g_atcmd_table[AT_CMD_TABLE_ROWS] = {
     /*  93 */ {"fingerprintMoudle testItem close", "", AutoTest_Fingerprint_Stop},
     /*  94 */ {"standbyMoudle testItem open", "", AutoTest_Standby_Enable},
     /*  95 */ {"standbyMoudle testItem close", "", AutoTest_Standby_Disable},
-    /*  96 */ {"WiFiMoudle testItem open", "", PENDING(AutoTest_WiFi_Enable)},
-    /*  97 */ {"WiFiMoudle testItem close", "", PENDING(AutoTest_WiFi_Disable)},
+    /*  96 */ {"WiFiMoudle testItem open", "", AutoTest_WiFi_Enable},
+    /*  97 */ {"WiFiMoudle testItem close", "", AutoTest_WiFi_Disable},
     /*  98 */ {"WiFiConCptMoudle testItem open", "", AutoTest_WiFiConCpt_Enable},
     /*  99 */ {"WiFiConCptMoudle testItem close", "", AutoTest_WiFiConCpt_Disable},
     /* 100 */ {"mmiMoudle testItem open", "", AutoTest_MMI_Enable},
@@ -185,10 +181,10 @@ const AtCmdRow g_atcmd_table[AT_CMD_TABLE_ROWS] = {
     /* 144 */ {"WgbPCBA testItem stop", "", PCBAAutotestWgbStop},
     /* 145 */ {"LightControl testItem Open", "", AutoTest_LightControl_Open},
     /* 146 */ {"LightControl testItem Close", "", AutoTest_LightControl_Close},
-    /* 147 */ {"SwitchSSID testItem", "", PENDING(AutoTest_SwitchSSID)},
+    /* 147 */ {"SwitchSSID testItem", "", AutoTest_SwitchSSID},
     /* 148 */ {"ConfigMoudle testItem write", "", AutoTest_Modify_ConfigFile},
-    /* 149 */ {"RSSIMoudle testItem read", "", PENDING(AutoTest_GetWiFiRSSI)},
-    /* 150 */ {"APInfoMoudle testItem read", "", PENDING(AutoTest_GetAPInfo)},
+    /* 149 */ {"RSSIMoudle testItem read", "", AutoTest_GetWiFiRSSI},
+    /* 150 */ {"APInfoMoudle testItem read", "", AutoTest_GetAPInfo},
     /* 151 */ {"PowerOffMoudle testItem close", "", AutoTest_PowerOff},
     /* 152 */ {"EnterLowCostMode testItem", "", AutoTest_EnterLowCostMode},
     /* 153 */ {"RebootMoudle testItem close", "", AutoTest_Reboot},
@@ -216,8 +212,8 @@ const AtCmdRow g_atcmd_table[AT_CMD_TABLE_ROWS] = {
     /* 172 */ {"CABCMoudle testItem open", "", AutoTest_CABC_Open},
     /* 173 */ {"CABCMoudle testItem close", "", AutoTest_CABC_Close},
     /* 174 */ {"LCDType testItem read", "", AutoTest_LCDType_Read},
-    /* 175 */ {"WiFiUDPServ testItem open", "", PENDING(WiFiUDPServ_Enable)},
-    /* 176 */ {"WiFiUDPServ testItem close", "", PENDING(WiFiUDPServ_Disable)},
+    /* 175 */ {"WiFiUDPServ testItem open", "", WiFiUDPServ_Enable},
+    /* 176 */ {"WiFiUDPServ testItem close", "", WiFiUDPServ_Disable},
     /* 177 */ {"WiFiDataRate testItem set", "", WiFiDataRate_set},
     /* 178 */ {"commonModule testItem showImage", "", PixelWorks_Calibrate_ShowPicture},
     /* 179 */ {"commonModule testItem close", "", PixelWorks_Calibrate_ShowPicture_Close},

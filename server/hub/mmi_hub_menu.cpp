@@ -13,7 +13,7 @@
 #include "mmi_theme.h"
 #include "pending/aging.h"
 #include "pending/coupling.h"
-#include "pending/wifi.h"
+#include "wifi/mmi_wifi.h"
 #include "screens/mmi_devicetest.h"
 #include "screens/mmi_infoscreen.h"
 #include "session/mmi_monomer.h"

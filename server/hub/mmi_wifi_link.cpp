@@ -2,7 +2,6 @@
 // that follows the link state (connect, connecting, disconnect) and the link key.
 #include "hub/mmi_wifi_link.h"
 
-#include <devfs.h>
 #include <errno.h>
 
 #include <string>
@@ -11,7 +10,7 @@
 #include "hub/mmi_mainwnd.h"
 #include "mmi_bars.h"
 #include "mmi_theme.h"
-#include "pending/wifi.h"
+#include "wifi/mmi_wifi.h"
 
 std::atomic<int> g_bWiFiConnectStatus{0};
 
@@ -36,9 +35,9 @@ void draw_link_picture(HWND hWnd, bool up) {
     FillBox(hdc, l.linkSquare.left, l.linkSquare.top + dy, RECTW(l.linkSquare),
             RECTH(l.linkSquare));
     if (up) {
-        char path[512];
         BITMAP bmp{};
-        if (dev_path(kLinkPicture, path, sizeof path) == 0 && LoadBitmap(hdc, &bmp, path) == 0) {
+        // The GUI library takes device paths, as on the handset.
+        if (LoadBitmap(hdc, &bmp, kLinkPicture) == 0) {
             int s = l.linkSide;
             FillBoxWithBitmap(hdc, w / 2 - s / 2, h / 2 - s + dy, s, s, &bmp);
             UnloadBitmap(&bmp);

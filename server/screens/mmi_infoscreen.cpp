@@ -11,6 +11,7 @@
 #include "core/ftx_lib_binding.h"
 #include "screens/mmi_identity.h"
 #include "screens/mmi_listscreen.h"
+#include "screens/mmi_qrscreen.h"
 #include "session/mmi_testinfo.h"
 #include "tp_os.h"
 #include "mmi_theme.h"
@@ -72,9 +73,16 @@ void draw_line(HWND hWnd, HSVITEM hsvi, HDC hdc, RECT *rc) {
                             s_lines[i].colour);
 }
 
+// Choosing the board-number row shows the board's bar code as a QR code.
+void choose(int row) {
+    if (row >= 0 && row < static_cast<int>(sizeof kIdentity / sizeof kIdentity[0]) &&
+        kIdentity[row].kind == MMI_ID_BOARD)
+        mmi_teswnd_QRCode();
+}
+
 // MSG_CALLBACK: the test information (IMEI) has arrived.
 const mmi_listscreen_desc kInfo = {
-    "Product Information", "menu_ProduceInfo", 4, 0, build_lines, draw_line, nullptr,
+    "Product Information", "menu_ProduceInfo", 4, 0, build_lines, draw_line, choose,
     MSG_CALLBACK,          &s_window};
 
 }  // namespace

@@ -15,6 +15,7 @@
 #include <android/log.h>
 
 #include "core/ftx_config.h"
+#include "core/mmi_thread_stop.h"
 #include "session/mmi_testitem.h"
 #include "mmi_bars.h"
 #include "minigui/control.h"
@@ -38,35 +39,6 @@ struct OpenWindow {
 };
 std::mutex s_openLock;
 std::vector<OpenWindow> s_open;
-
-// SIGUSR1, only ever sent with pthread_kill, asks the sleeping thread to end: it wakes from
-// its sleep and returns, so nothing is unwound inside the handler.
-thread_local volatile sig_atomic_t t_stopRequested;
-
-void signalHandler(int) {
-    t_stopRequested = 1;
-}
-
-void install_stop_handler() {
-    struct sigaction sa;
-    memset(&sa, 0, sizeof(sa));
-    sa.sa_handler = signalHandler;
-    sigemptyset(&sa.sa_mask);
-    sigaction(SIGUSR1, &sa, nullptr);
-}
-
-// The platform's scaled sleep, cut short by SIGUSR1; false when it was.
-bool sleep_unless_stopped(unsigned long us) {
-    if (t_stopRequested) return false;  // asked before the sleep began
-    double scaled = (double)us * tp_os_time_scale();
-    struct timespec ts;
-    ts.tv_sec = (time_t)(scaled / 1e6);
-    ts.tv_nsec = (long)((scaled - (double)ts.tv_sec * 1e6) * 1000.0);
-    while (nanosleep(&ts, &ts) != 0) {
-        if (errno != EINTR || t_stopRequested) break;
-    }
-    return !t_stopRequested;
-}
 
 const mmi_testwnd_desc *desc_of(HWND hWnd) {
     return reinterpret_cast<const mmi_testwnd_desc *>(GetWindowAdditionalData(hWnd));
@@ -420,7 +392,7 @@ void *WaitForFoolProof(void *arg) {
     mmi_testwnd_state *st = static_cast<mmi_testwnd_state *>(arg);
     const unsigned generation = st->generation.load();
     const char *tag = st->tag.load();
-    install_stop_handler();
+    mmi_thread_stop_install();
     TW_DEBUG(tag, "WaitForFoolProof begin.hwnd = %d", (int)(intptr_t)st->hwnd.load());
     // SIGUSR1 reaches the thread only while it sleeps: never while it holds a lock (another
     // part's handler in force may end the thread outright).
@@ -428,7 +400,7 @@ void *WaitForFoolProof(void *arg) {
     sigemptyset(&usr1);
     sigaddset(&usr1, SIGUSR1);
     pthread_sigmask(SIG_UNBLOCK, &usr1, nullptr);
-    bool slept = sleep_unless_stopped((unsigned long)st->foolProofSeconds.load() * 1000000UL);
+    bool slept = mmi_sleep_unless_stopped((unsigned long)st->foolProofSeconds.load() * 1000000UL);
     pthread_sigmask(SIG_BLOCK, &usr1, nullptr);
     if (!slept) {
         TW_DEBUG(tag, "WaitForFoolProof stopped");
@@ -450,7 +422,7 @@ void *WaitForFoolProof(void *arg) {
 }
 
 int mmi_testwnd_start_foolproof(mmi_testwnd_state *st, int seconds, const char *tag) {
-    install_stop_handler();
+    mmi_thread_stop_install();
     std::lock_guard<std::mutex> lk(st->lock);
     st->foolProofSeconds = seconds;
     st->tag = tag;

@@ -1,8 +1,9 @@
 // The handset's command-line tools on the host: one program under many names, linked into
 // the build's handset tool folder, where device shell lines find them. toybox's file applets
 // run the host's own tools, and only on paths inside the device root; tools that would change
-// the kernel, the radio or the machine only record what they were asked. Every call is
-// recorded in $FTX_ROOT/log/tools.txt with device paths.
+// the kernel, the radio or the machine only record what they were asked; the Wi-Fi tools work
+// the simulated network (sim/wifi). Every call is recorded in $FTX_ROOT/log/tools.txt with
+// device paths.
 #include <errno.h>
 #include <fcntl.h>
 #include <limits.h>
@@ -17,6 +18,7 @@
 
 #include "shell_line.h"
 #include "tool_record.h"
+#include "wifi_tools.h"
 
 using ftxhandset::under;
 
@@ -26,6 +28,7 @@ enum class Kind {
     Toybox,      // the multi-call tool: its first argument names the applet
     FileApplet,  // a toybox applet that works on files of the device root
     Recorder,    // a kernel or radio tool: recorded, and it succeeds
+    Wifi,        // the simulated Wi-Fi network's tools (sim/wifi)
 };
 
 struct Tool {
@@ -34,14 +37,20 @@ struct Tool {
 };
 
 const Tool kTools[] = {
-    {"toybox", Kind::Toybox},    {"cat", Kind::FileApplet},          {"chmod", Kind::FileApplet},
-    {"cp", Kind::FileApplet},    {"echo", Kind::FileApplet},         {"false", Kind::FileApplet},
-    {"grep", Kind::FileApplet},  {"head", Kind::FileApplet},         {"ls", Kind::FileApplet},
-    {"mkdir", Kind::FileApplet}, {"mv", Kind::FileApplet},           {"rm", Kind::FileApplet},
-    {"sleep", Kind::FileApplet}, {"sync", Kind::FileApplet},         {"tail", Kind::FileApplet},
-    {"touch", Kind::FileApplet}, {"true", Kind::FileApplet},         {"wc", Kind::FileApplet},
-    {"dhcpcd", Kind::Recorder},  {"dhcptool", Kind::Recorder},       {"insmod", Kind::Recorder},
-    {"iwpriv", Kind::Recorder},  {"ptt_socket_app", Kind::Recorder}, {"rmmod", Kind::Recorder},
+    {"toybox", Kind::Toybox},         {"cat", Kind::FileApplet},
+    {"chmod", Kind::FileApplet},      {"cp", Kind::FileApplet},
+    {"echo", Kind::FileApplet},       {"false", Kind::FileApplet},
+    {"grep", Kind::FileApplet},       {"head", Kind::FileApplet},
+    {"ls", Kind::FileApplet},         {"mkdir", Kind::FileApplet},
+    {"mv", Kind::FileApplet},         {"rm", Kind::FileApplet},
+    {"sleep", Kind::FileApplet},      {"sync", Kind::FileApplet},
+    {"tail", Kind::FileApplet},       {"touch", Kind::FileApplet},
+    {"true", Kind::FileApplet},       {"wc", Kind::FileApplet},
+    {"dhcpcd", Kind::Wifi},           {"dhcptool", Kind::Wifi},
+    {"insmod", Kind::Recorder},       {"iwpriv", Kind::Recorder},
+    {"rmmod", Kind::Recorder},        {"ptt_socket_app", Kind::Recorder},
+    {"wpa_cli", Kind::Wifi},          {"pv_wifi_init.sh", Kind::Wifi},
+    {"pv_wifi_close.sh", Kind::Wifi},
 };
 
 const char kSelf[] = "ftx-handset";
@@ -171,6 +180,8 @@ int main(int argc, char **argv) {
     switch (tool->kind) {
         case Kind::Toybox: {
             if (argc < 2) return 0;
+            if (strcmp(argv[1], "ifconfig") == 0)
+                return ftxwifi::wifi_ifconfig(real_root(), argc - 2, argv + 2);
             const Tool *applet = find_tool(argv[1]);
             if (applet == nullptr || applet->kind != Kind::FileApplet) return 0;
             return file_applet(argv[1], argc - 2, argv + 2);
@@ -179,6 +190,15 @@ int main(int argc, char **argv) {
             return file_applet(name, argc - 1, argv + 1);
         case Kind::Recorder:
             return 0;
+        case Kind::Wifi: {
+            const std::string root = real_root();
+            if (root.empty()) {
+                fprintf(stderr, "%s: the device root is not set\n", name.c_str());
+                return 127;
+            }
+            auto inside = [&root](const std::string &path) { return inside_root(path, root); };
+            return ftxwifi::run_wifi_tool(name, root, inside, argc - 1, argv + 1);
+        }
     }
     return 0;
 }

@@ -24,6 +24,7 @@ const Layer kLayers[] = {
     {"server/pending", 4, false},
     {"server/screens", 5, false},
     {"server/pcba", 5, false},
+    {"server/wifi", 5, false},
     {"server/adbd_connection", 6, false},
     {"server/hub", 7, false},
     {"server", 8, true},  // the program's start

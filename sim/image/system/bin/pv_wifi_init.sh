@@ -1,0 +1,1 @@
+A handset tool: the platform runs the build's own program of this name, never this file.
