@@ -36,6 +36,7 @@
 
 namespace {
 
+const char kCtrlDir[] = "/data/misc/wifi/sockets";
 const char kCtrlPath[] = "/data/misc/wifi/sockets/wlan0";
 const char kSsidFile[] = "/cache/pv_wifi_switch_ssid.cfg";
 const char kInitScript[] = "/system/bin/pv_wifi_init.sh";
@@ -121,11 +122,15 @@ struct wpa_ctrl *s_ctrl = nullptr;
 std::atomic<int> s_netId{-1};
 
 bool ctrl_open() {
-    char path[512];
+    char path[512], clientDir[512];
     if (dev_path(kCtrlPath, path, sizeof path) != 0) return false;
     std::lock_guard<std::mutex> lk(s_ctrlLock);
     if (s_ctrl != nullptr) wpa_ctrl_close(s_ctrl);
-    s_ctrl = wpa_ctrl_open(path);
+    // The client's own socket beside the supplicant's, as on the handset; the library's
+    // default folder when that path is too long for a socket name.
+    s_ctrl = dev_path(kCtrlDir, clientDir, sizeof clientDir) == 0 ? wpa_ctrl_open2(path, clientDir)
+                                                                  : nullptr;
+    if (s_ctrl == nullptr) s_ctrl = wpa_ctrl_open(path);
     return s_ctrl != nullptr;
 }
 
