@@ -224,7 +224,7 @@ TEST(Pc, VibratorIdentityBatteryAndDialog) {
     auto imei = h.dut.pc("IMEIMoudle testItem read");
     EXPECT_EQ(0, imei.first);
     EXPECT_EQ("860000000000001", imei.second);
-    EXPECT_EQ("*FTXSIM0000000001", h.dut.pc("barcodeMoudle testItem read").second);
+    EXPECT_EQ("*FTXSIM000001", h.dut.pc("barcodeMoudle testItem read").second);
     EXPECT_EQ("*FTX_SIM_V1.0.0", h.dut.pc("softwareMoudle testItem external").second);
     EXPECT_EQ(2, h.dut.pc("testinfoMoudle testItem").first);
 
