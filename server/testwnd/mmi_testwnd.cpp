@@ -346,6 +346,12 @@ int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st,
     return answer;
 }
 
+void mmi_ownwnd_created(mmi_ownwnd_state *st, HWND hWnd, const char *tag) {
+    mmi_set_current_test(tag);
+    st->hwnd = hWnd;
+    st->created = 1;
+}
+
 void mmi_ownwnd_destroy(mmi_ownwnd_state *st, HWND hWnd) {
     mmi_set_current_test("");
     st->created = 0;

@@ -157,6 +157,21 @@ int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st, int (*verdict)(char *reply, unsigne
 int mmi_ownwnd_pc_stop(mmi_ownwnd_state *st,
                        int (*verdict)(const void *ctx, char *reply, unsigned int size),
                        const void *ctx, char *reply, unsigned int size);
+// MSG_CREATE's common start: the window becomes the current test (tag) and is known as
+// created, so that the library's reports and the PC can reach it from then on.
+void mmi_ownwnd_created(mmi_ownwnd_state *st, HWND hWnd, const char *tag);
+// The verdict keys and the run's fail-and-quit: the fail key or MSG_FAILANDQUIT calls fail(),
+// the pass key calls pass() while a pass is offered; true when the message did either.
+template <typename Pass, typename Fail>
+bool mmi_ownwnd_verdict(UINT message, WPARAM wParam, bool passOffered, Pass pass, Fail fail) {
+    if (message == MSG_FAILANDQUIT || (message == MSG_KEYDOWN && wParam == MMI_KEY_FAIL))
+        fail();
+    else if (message == MSG_KEYDOWN && wParam == MMI_KEY_PASS && passOffered)
+        pass();
+    else
+        return false;
+    return true;
+}
 // MSG_CLOSE's common end: no current test, the flags cleared, the window unregistered and
 // destroyed with its controls.
 void mmi_ownwnd_destroy(mmi_ownwnd_state *st, HWND hWnd);

@@ -117,29 +117,51 @@ void DeviceUnderTest::setProperty(const std::string &name, const std::string &va
     write("/sim/properties", out);
 }
 
-void DeviceUnderTest::setConfig(const std::string &domain, const std::string &key,
-                                const std::string &value) const {
-    std::istringstream in(read("/etc/ftx_config.ini"));
+namespace {
+
+// text with key=value in [section]: the key's line replaced, or added at the section's end
+// (and, with addSection, the section added when missing); an empty value removes the key.
+// Added lines end in eol; the others keep theirs.
+std::string with_ini_key(const std::string &text, const std::string &section,
+                         const std::string &key, const std::string &value, const char *eol,
+                         bool addSection) {
+    std::istringstream in(text);
     std::string line, out, current;
     bool done = false;
     auto add = [&] {
-        if (!done && current == domain && !value.empty()) out += key + "=" + value + "\r\n";
-        done = done || current == domain;
+        if (!done && current == section && !value.empty()) out += key + "=" + value + eol;
+        done = done || current == section;
     };
     while (std::getline(in, line)) {
         std::string bare = line;
         if (!bare.empty() && bare.back() == '\r') bare.pop_back();
         if (!bare.empty() && bare[0] == '[') {
-            if (current == domain) add();
+            if (current == section) add();
             current = bare.substr(1, bare.find(']') - 1);
-        } else if (current == domain && bare.rfind(key + "=", 0) == 0) {
+        } else if (current == section && bare.rfind(key + "=", 0) == 0) {
             add();
             continue;
         }
         out += line + "\n";
     }
-    if (current == domain) add();
-    write("/etc/ftx_config.ini", out);
+    if (current == section) add();
+    if (!done && addSection && !value.empty())
+        out += "[" + section + "]" + eol + key + "=" + value + eol;
+    return out;
+}
+
+}  // namespace
+
+void DeviceUnderTest::setConfig(const std::string &domain, const std::string &key,
+                                const std::string &value) const {
+    write("/etc/ftx_config.ini",
+          with_ini_key(read("/etc/ftx_config.ini"), domain, key, value, "\r\n", false));
+}
+
+void DeviceUnderTest::setDeviceIni(const std::string &section, const std::string &key,
+                                   const std::string &value) const {
+    write("/sim/device.ini",
+          with_ini_key(read("/sim/device.ini"), section, key, value, "\n", true));
 }
 
 void DeviceUnderTest::setEnv(const std::string &name, const std::string &value) {

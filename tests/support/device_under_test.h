@@ -34,6 +34,9 @@ class DeviceUnderTest {
     // removes the key.
     void setConfig(const std::string &domain, const std::string &key,
                    const std::string &value) const;
+    // The same in the simulated handset's sim/device.ini (LF; a missing section is added).
+    void setDeviceIni(const std::string &section, const std::string &key,
+                      const std::string &value) const;
 
     // Extra environment for the process (FTX_TIME_SCALE, LD_LIBRARY_PATH, ...), before start.
     void setEnv(const std::string &name, const std::string &value);

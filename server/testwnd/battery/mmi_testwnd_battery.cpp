@@ -158,13 +158,18 @@ void paint(HWND hWnd) {
 }
 
 LRESULT battery_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
+    if (mmi_ownwnd_verdict(
+            message, wParam, s.passOffered, [&] { pass_and_close(hWnd); },
+            [&] {
+                if (message == MSG_KEYDOWN) BAT_DEBUG("%s fail key", __func__);
+                fail_and_close(hWnd);
+            }))
+        return 0;
     switch (message) {
         case MSG_CREATE:
             if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
             memset(&s, 0, sizeof s);
-            mmi_set_current_test(kTag);
-            s_wnd.hwnd = hWnd;
-            s_wnd.created = 1;
+            mmi_ownwnd_created(&s_wnd, hWnd, kTag);
             refresh(hWnd);  // one refresh of two: the window cannot pass before it shows
             SetTimer(hWnd, kTimerId, kTimerPeriod);
             break;
@@ -184,15 +189,6 @@ LRESULT battery_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             }
             return 0;
         case MSG_KEYDOWN:
-            if (wParam == MMI_KEY_FAIL) {
-                BAT_DEBUG("%s fail key", __func__);
-                fail_and_close(hWnd);
-            } else if (wParam == MMI_KEY_PASS && s.passOffered) {
-                pass_and_close(hWnd);
-            }
-            return 0;
-        case MSG_FAILANDQUIT:
-            fail_and_close(hWnd);
             return 0;
         case MSG_CLOSE:
             KillTimer(hWnd, kTimerId);

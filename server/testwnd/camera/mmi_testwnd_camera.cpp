@@ -232,17 +232,19 @@ LRESULT camera_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     if (index >= sizeof kCameras / sizeof kCameras[0])
         return DefaultMainWinProc(hWnd, message, wParam, lParam);
     const Camera &c = kCameras[index];
+    if (mmi_ownwnd_verdict(
+            message, wParam, s.passOffered, [&] { pass_and_close(hWnd, c); },
+            [&] { fail_and_close(hWnd, c); }))
+        return 0;
     switch (message) {
         case MSG_CREATE: {
             mmi_testwnd_create_title(hWnd, c.row->titleKey);
-            mmi_set_current_test(c.row->domain);
             s = Screen{};
             RECT client;
             GetClientRect(hWnd, &client);
             mmi_camera_layout_for(RECTW(client), RECTH(client),
                                   mmi_logfont_size(3, g_ptScreenInfo.width) * 3 / 2, &s.layout);
-            c.state->wnd.hwnd = hWnd;
-            c.state->wnd.created = 1;
+            mmi_ownwnd_created(&c.state->wnd, hWnd, c.row->domain);
             start_camera(hWnd, c);
             break;
         }
@@ -265,17 +267,10 @@ LRESULT camera_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             }
             return 0;
         case MSG_KEYDOWN:
-            if (wParam == MMI_KEY_PASS && s.passOffered) {
-                pass_and_close(hWnd, c);
-            } else if (wParam == MMI_KEY_FAIL) {
-                fail_and_close(hWnd, c);
-            } else if (wParam == 62 || wParam == 28) {
+            if (wParam == 62 || wParam == 28) {
                 char path[kPathSize];
                 snapshot(hWnd, c, path, sizeof path);
             }
-            return 0;
-        case MSG_FAILANDQUIT:
-            fail_and_close(hWnd, c);
             return 0;
         case MSG_CLOSE:
             KillTimer(hWnd, kPreviewTimer);

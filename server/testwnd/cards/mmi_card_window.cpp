@@ -246,12 +246,14 @@ LRESULT card_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
     if (d == nullptr) return DefaultMainWinProc(hWnd, message, wParam, lParam);
     mmi_cardwnd_state *st = d->state;
     const char *tag = d->row->domain;
+    if (mmi_ownwnd_verdict(
+            message, wParam, st->passOffered, [&] { pass_and_close(hWnd, d); },
+            [&] { fail_and_close(hWnd, d); }))
+        return 0;
     switch (message) {
         case MSG_CREATE:
             mmi_testwnd_create_title(hWnd, d->row->titleKey);
-            mmi_set_current_test(tag);
-            st->wnd.hwnd = hWnd;
-            st->wnd.created = 1;
+            mmi_ownwnd_created(&st->wnd, hWnd, tag);
             lib_start(d);
             refresh(d);  // shown at once; a pass waits for the first second
             SetTimer(hWnd, kTimerId, kTimerPeriod);
@@ -274,14 +276,6 @@ LRESULT card_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             judge(hWnd, d);
             return 0;
         case MSG_KEYDOWN:
-            if (wParam == MMI_KEY_PASS && st->passOffered) {
-                pass_and_close(hWnd, d);
-            } else if (wParam == MMI_KEY_FAIL) {
-                fail_and_close(hWnd, d);
-            }
-            return 0;
-        case MSG_FAILANDQUIT:
-            fail_and_close(hWnd, d);
             return 0;
         case MSG_CLOSE:
             KillTimer(hWnd, kTimerId);

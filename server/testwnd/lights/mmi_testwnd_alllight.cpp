@@ -100,12 +100,13 @@ void paint(HWND hWnd) {
 }
 
 LRESULT alllight_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
+    if (mmi_ownwnd_verdict(
+            message, wParam, s.lit, [&] { pass_step(hWnd); }, [&] { fail(hWnd); }))
+        return 0;
     switch (message) {
         case MSG_CREATE:
             if (g_mmiLogFont[3]) SetWindowFont(hWnd, g_mmiLogFont[3]);
-            mmi_set_current_test(kTag);
-            s_wnd.hwnd = hWnd;
-            s_wnd.created = 1;
+            mmi_ownwnd_created(&s_wnd, hWnd, kTag);
             start_step(hWnd);
             break;
         case MSG_ACTIVE:
@@ -117,14 +118,6 @@ LRESULT alllight_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             paint(hWnd);
             return 0;
         case MSG_KEYDOWN:
-            if (wParam == MMI_KEY_FAIL) {
-                fail(hWnd);
-            } else if (wParam == MMI_KEY_PASS && s.lit) {
-                pass_step(hWnd);
-            }
-            return 0;
-        case MSG_FAILANDQUIT:
-            fail(hWnd);
             return 0;
         case MSG_CLOSE:
             light_off();

@@ -18,16 +18,6 @@ using handset::Png;
 const handset::Item kVibrator = {"FTX_VIBRATOR", 1, 0, 1};
 const char kBoardCode[] = "Board Code";
 
-// The simulated board answers this bar code.
-void setBarcode(Handset &h, const std::string &code) {
-    std::string ini = h.dut.read("/sim/device.ini");
-    const std::string key = "\nbarcode=";
-    size_t at = ini.find(key);
-    ASSERT_NE(std::string::npos, at);
-    ini.replace(at + key.size(), ini.find('\n', at + 1) - at - key.size(), code);
-    h.dut.write("/sim/device.ini", ini);
-}
-
 // From the menu to the board-code screen as an operator goes: device test, information,
 // down to the board number (row 4), OK.
 void openBoardCode(Handset &h) {
@@ -51,7 +41,7 @@ Png codeShown(Handset &h, const std::string &name) {
 
 TEST(BoardCodeScreen, ShowsTheBoardsBarCodeForAScannerAndTheBackKeyCloses) {
     Handset h({kVibrator});
-    setBarcode(h, "FTX000000042");
+    h.dut.setDeviceIni("identity", "barcode", "FTX000000042");
     ASSERT_TRUE(h.start());
     openBoardCode(h);
     Png shot = codeShown(h, "board_code.png");
@@ -83,7 +73,7 @@ TEST(BoardCodeScreen, ShowsTheBoardsBarCodeForAScannerAndTheBackKeyCloses) {
 
 TEST(BoardCodeScreen, ABarCodeTooLongShowsZerosAndTheRightSoftKeyCloses) {
     Handset h({kVibrator});
-    setBarcode(h, "FTX0000000042");  // 13 characters
+    h.dut.setDeviceIni("identity", "barcode", "FTX0000000042");  // 13 characters
     ASSERT_TRUE(h.start());
     openBoardCode(h);
     codeShown(h, "board_code_zeros.png");

@@ -289,9 +289,7 @@ TEST(LcdPc, ThePanelTypeComesFromTheImage) {
     EXPECT_EQ(0, r.first);
     EXPECT_EQ("JDI", r.second);
     h.dut.stop();
-    std::string ini = h.dut.read("/sim/device.ini");
-    ini.replace(ini.find("type=JDI"), 8, "type=Truly");
-    h.dut.write("/sim/device.ini", ini);
+    h.dut.setDeviceIni("panel", "type", "Truly");
     ASSERT_TRUE(h.start());
     ASSERT_TRUE(h.dut.waitChannel());
     r = h.dut.pc("LCDType testItem read");

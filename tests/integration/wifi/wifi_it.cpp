@@ -80,18 +80,6 @@ struct Wifi : ::testing::Test {
     }
     // The main menu's link key.
     void linkKey() { h.key(62); }
-    // Adds key=value to a section of the root's sim/device.ini (before start).
-    void deviceIni(const std::string &section, const std::string &line) {
-        std::string ini = h.dut.read("/sim/device.ini");
-        const std::string head = "[" + section + "]\n";
-        size_t at = ini.find(head);
-        if (at == std::string::npos) {
-            ini += "\n" + head;
-            at = ini.find(head);
-        }
-        ini.insert(at + head.size(), line + "\n");
-        h.dut.write("/sim/device.ini", ini);
-    }
     // What the supplicant was asked, in order.
     std::string requests() {
         std::ifstream in(h.dut.root() + "/log/wpa_supplicant.txt");
@@ -149,8 +137,8 @@ TEST_F(Wifi, TheLinkKeyJoinsTheNetworkAndTheMenuShowsTheAddressAsAQrCode) {
 
 TEST_F(Wifi, AnOpenNetworkIsJoinedWithoutAKey) {
     h.dut.setConfig("MMI", "WiFiCtrlParameter", "def_ssid:OPEN_NET;key_mgmt:NONE;wifi_init:1");
-    deviceIni("wifi", "ap2.ssid=OPEN_NET");
-    deviceIni("wifi", "ap2.key_mgmt=NONE");
+    h.dut.setDeviceIni("wifi", "ap2.ssid", "OPEN_NET");
+    h.dut.setDeviceIni("wifi", "ap2.key_mgmt", "NONE");
     start();
     EXPECT_EQ(answer(0, ""), h.dut.pc("WiFiMoudle testItem open"));
     ASSERT_TRUE(h.dut.waitLog(kLinkUp));
@@ -244,7 +232,7 @@ TEST_F(Wifi, RssiAndAccessPointInformationComeThroughTheRealClient) {
 
 TEST_F(Wifi, TheUdpEchoAnswersWholeDatagramsUpTo256BytesUntilDisabled) {
     const int port = free_udp_port();
-    deviceIni("ports", "udp_3536=" + std::to_string(port));
+    h.dut.setDeviceIni("ports", "udp_3536", std::to_string(port));
     start();
     EXPECT_EQ(answer(0, ""), h.dut.pc("WiFiUDPServ testItem open"));
     ASSERT_TRUE(
