@@ -19,5 +19,12 @@
 // Posted by the soft-key bar after a tap on a slot (wParam: slot number).
 #define MSG_SOFTKEYTAP 7216
 
+// The data a main window was created with (dwAddData): in MSG_CREATE from the create record,
+// later from the window.
+static inline DWORD mmi_window_data(HWND hWnd, UINT message, LPARAM lParam) {
+    return message == MSG_CREATE ? reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData
+                                 : GetWindowAdditionalData(hWnd);
+}
+
 // The main window's refresh timer of the two bars.
 #define MMI_TIMER_BARS 1

@@ -257,10 +257,6 @@ void stop_check(const Check &c) {
 
 // ---- the window ----
 
-const Check *check_of(HWND hWnd) {
-    return reinterpret_cast<const Check *>(GetWindowAdditionalData(hWnd));
-}
-
 void text_at(HDC hdc, PLOGFONT font, int colour, const char *text, RECT box, UINT format) {
     if (font) SelectFont(hdc, font);
     SetTextColor(hdc, mmi_pixel(colour));
@@ -405,9 +401,7 @@ Verdict verdict_now() {
 }
 
 LRESULT pcba_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
-    const Check *c = check_of(hWnd);
-    if (message == MSG_CREATE)
-        c = reinterpret_cast<const Check *>(reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
+    const auto *c = reinterpret_cast<const Check *>(mmi_window_data(hWnd, message, lParam));
     if (c == nullptr) return DefaultMainWinProc(hWnd, message, wParam, lParam);
     switch (message) {
         case MSG_CREATE:

@@ -227,8 +227,7 @@ void paint(HWND hWnd) {
 }
 
 LRESULT camera_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
-    DWORD index = message == MSG_CREATE ? reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData
-                                        : GetWindowAdditionalData(hWnd);
+    const DWORD index = mmi_window_data(hWnd, message, lParam);
     if (index >= sizeof kCameras / sizeof kCameras[0])
         return DefaultMainWinProc(hWnd, message, wParam, lParam);
     const Camera &c = kCameras[index];

@@ -20,10 +20,6 @@ constexpr int kTimerId = 131;
 constexpr int kTimerPeriod = 100;  // 10 ms units (scaled like every wait): one second
 constexpr int kSimSlotsDefault = 2;
 
-const mmi_cardwnd_desc *desc_of(HWND hWnd) {
-    return reinterpret_cast<const mmi_cardwnd_desc *>(GetWindowAdditionalData(hWnd));
-}
-
 int clamp(int v, int lo, int hi) {
     return v < lo ? lo : v > hi ? hi : v;
 }
@@ -239,10 +235,8 @@ void tick(HWND hWnd, const mmi_cardwnd_desc *d) {
 }
 
 LRESULT card_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
-    const mmi_cardwnd_desc *d = desc_of(hWnd);
-    if (message == MSG_CREATE)
-        d = reinterpret_cast<const mmi_cardwnd_desc *>(
-            reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
+    const auto *d =
+        reinterpret_cast<const mmi_cardwnd_desc *>(mmi_window_data(hWnd, message, lParam));
     if (d == nullptr) return DefaultMainWinProc(hWnd, message, wParam, lParam);
     mmi_cardwnd_state *st = d->state;
     const char *tag = d->row->domain;

@@ -16,10 +16,6 @@
 
 namespace {
 
-const mmi_sensorwnd_desc *desc_of(HWND hWnd) {
-    return reinterpret_cast<const mmi_sensorwnd_desc *>(GetWindowAdditionalData(hWnd));
-}
-
 double param_double(const ftx_config_para *p, int n, const char *key, double def) {
     if (key == nullptr) return def;
     char value[FTX_CFG_TEXT_SIZE] = {0};
@@ -194,10 +190,8 @@ void paint(HWND hWnd, const mmi_sensorwnd_desc *d) {
 }
 
 LRESULT sensor_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
-    const mmi_sensorwnd_desc *d = desc_of(hWnd);
-    if (message == MSG_CREATE)
-        d = reinterpret_cast<const mmi_sensorwnd_desc *>(
-            reinterpret_cast<PMAINWINCREATE>(lParam)->dwAddData);
+    const auto *d =
+        reinterpret_cast<const mmi_sensorwnd_desc *>(mmi_window_data(hWnd, message, lParam));
     if (d == nullptr) return DefaultMainWinProc(hWnd, message, wParam, lParam);
     mmi_sensorwnd_state *st = d->state;
     const char *tag = d->row->domain;
