@@ -3,7 +3,9 @@
 # Usage: ./ftx run [--headless] [--root DIR] [--fresh] [--screen WxH]
 # Prepares the device root from sim/image when it is missing (--fresh makes it anew),
 # restarts the application when it asks for a reboot (exit status 101) and stops on a
-# power-off (100), on Ctrl-C or on any other end.
+# power-off (100), on Ctrl-C or on any other end. After a power-off with the RTC alarm
+# (ROOT/sys/class/rtc/rtc0/wakealarm) armed in the future, it waits until the alarm time,
+# clears the alarm and starts the application again.
 # The log, ROOT/log/logcat.txt, keeps every priority: FTX_LOG_LEVEL=I (or W, E) raises the
 # floor, FTX_LOG_STDERR=1 echoes it here. It is a ring: past FTX_LOG_ROTATE_KB (4096) the
 # file becomes logcat.txt.1 and the oldest of FTX_LOG_ROTATE_COUNT (4) rotated files goes.
@@ -67,9 +69,35 @@ PORT="${FTX_PC_PORT:-$(sed -n '/^\[pc\]/,/^\[/s/^port=//p' "$ROOT/sim/device.ini
 PORT="${PORT:-20051}"
 export FTX_PC_PORT="$PORT"
 
+# Sleeps until the epoch second $1 (Ctrl-C still stops at once: the trap kills the sleep).
+sleep_until() {
+  local left=$(( $1 * 1000000000 - $(date +%s%N) ))
+  [ "$left" -gt 0 ] || return 0
+  sleep "$(( left / 1000000000 )).$(printf '%09d' $(( left % 1000000000 )))" &
+  wait $!
+}
+
+# The RTC alarm after a power-off: 0 when the application is to stay off.
+ALARM_FILE="$ROOT/sys/class/rtc/rtc0/wakealarm"
+rtc_alarm() {
+  local at
+  at="$(tr -d '[:space:]' < "$ALARM_FILE" 2>/dev/null)"
+  if [[ "$at" =~ ^[0-9]{1,12}$ ]] && (( 10#$at > $(date +%s) )); then
+    echo "$(( 10#$at ))"
+  else
+    echo 0
+  fi
+}
+
 CHILD=0
 stop() {
-  [ "$CHILD" != 0 ] && kill -TERM "$CHILD" 2>/dev/null && wait "$CHILD" 2>/dev/null
+  # Every child still running: the application, or the sleep until the RTC alarm.
+  local pids
+  pids="$(jobs -p)"
+  if [ -n "$pids" ]; then
+    kill -TERM $pids 2>/dev/null
+    wait $pids 2>/dev/null
+  fi
   say "stopped"
   exit 130
 }
@@ -87,7 +115,13 @@ while :; do
   CHILD=0
   case "$STATUS" in
     101) say "reboot requested: starting again" ;;
-    100) say "powered off"; exit 0 ;;
+    100)
+      AT="$(rtc_alarm)"
+      [ "$AT" = 0 ] && { say "powered off"; exit 0; }
+      say "powered off: the RTC alarm starts it again at $(date -d "@$AT" '+%Y-%m-%d %H:%M:%S')"
+      sleep_until "$AT"
+      : > "$ALARM_FILE"
+      say "RTC alarm: starting again" ;;
     *) say "ftx-mmi ended with status $STATUS"; exit "$STATUS" ;;
   esac
 done

@@ -13,6 +13,7 @@
 #include "devfs.h"
 #include "ftx_host.h"
 #include "host_internal.h"
+#include "kernel_files.h"
 #include "shell_line.h"
 
 namespace {
@@ -79,7 +80,11 @@ const char *mapped(const char *path, char *buf, size_t size) {
 extern "C" FILE *dev_fopen(const char *path, const char *mode) {
     char buf[4096];
     const char *p = mapped(path, buf, sizeof(buf));
-    return p != nullptr ? fopen(p, mode) : nullptr;
+    if (p == nullptr) return nullptr;
+    // The RTC alarm and the power state act on writes, as their drivers do.
+    FILE *kernel;
+    if (ftxhost::open_kernel_file(path, p, mode, &kernel)) return kernel;
+    return fopen(p, mode);
 }
 
 extern "C" int dev_open(const char *path, int flags, ...) {

@@ -180,11 +180,14 @@ const ftx_sym_binding kFirmwareSet[] = {REQ(ftx_api_GetFireWare)};
 const ftx_sym_binding kBatteryTestSet[] = {REQ(ftx_api_Battery_Test)};
 // The preview is optional: a library without it gives the window no frames.
 const ftx_sym_binding kCameraSet[] = {ANY(ftx_api_camera_get_preview)};
+// The lights always; the others only where no earlier binder bound them.
+#define REQ_UNSET(name) \
+    { #name, &hw::name, FTX_BIND_REQUIRED_IF_UNSET, nullptr, nullptr }
 const ftx_sym_binding kAgingSet[] = {
-    REQ(ftx_api_AlllightTest_Start),   REQ(ftx_api_AlllightTest_Stop),
-    REQ(ftx_api_Audio_RingTest_Start), REQ(ftx_api_Audio_RingTest_Stop),
-    REQ(ftx_api_BTDevDetect),          REQ(ftx_api_FMDevDetect),
-    REQ(ftx_api_WifiDevDetect),        REQ(ftx_api_cameraID_test)};
+    REQ(ftx_api_AlllightTest_Start),         REQ(ftx_api_AlllightTest_Stop),
+    REQ_UNSET(ftx_api_Audio_RingTest_Start), REQ_UNSET(ftx_api_Audio_RingTest_Stop),
+    REQ_UNSET(ftx_api_cameraID_test),        REQ_UNSET(ftx_api_WifiDevDetect),
+    REQ_UNSET(ftx_api_BTDevDetect),          REQ_UNSET(ftx_api_FMDevDetect)};
 // The aging binder may have bound the camera-ID check already.
 const ftx_sym_binding kPcbaSet[] = {
     ANY(ftx_api_cpu_start),
@@ -271,7 +274,7 @@ int bind_feature(const feature_binder &b, const char *tag) {
     if (tag == nullptr) tag = b.tag;
     void *handle = lib_dvk_factory.load();
     if (handle == nullptr) {
-        if (&b == &kPcba)
+        if (&b == &kPcba || &b == &kAging)
             __android_log_print(ANDROID_LOG_ERROR, tag,
                                 "FATAL ERROR: could not find lib_factory.so\n");
         else
@@ -302,7 +305,8 @@ int ftx_bind_symbols(void *handle, const char *libLabel, const char *tag, const 
                      const ftx_sym_binding *rows, int count) {
     for (int i = 0; i < count; i++) {
         const ftx_sym_binding &r = rows[i];
-        if (r.kind == FTX_BIND_IF_UNSET && r.slot->get() != nullptr) continue;
+        const bool ifUnset = r.kind == FTX_BIND_IF_UNSET || r.kind == FTX_BIND_REQUIRED_IF_UNSET;
+        if (ifUnset && r.slot->get() != nullptr) continue;
         void *p = dlsym(handle, r.name);
         if (p != nullptr) {
             r.slot->set(p);
@@ -317,7 +321,7 @@ int ftx_bind_symbols(void *handle, const char *libLabel, const char *tag, const 
         __android_log_print(ANDROID_LOG_ERROR, tag, "FATAL ERROR: could not dlsym %s::%s\n",
                             libLabel, r.shownName != nullptr ? r.shownName : r.name);
         log_loader_error(tag, binder);
-        if (r.kind == FTX_BIND_REQUIRED) return -1;
+        if (r.kind == FTX_BIND_REQUIRED || r.kind == FTX_BIND_REQUIRED_IF_UNSET) return -1;
     }
     return 0;
 }

@@ -197,10 +197,11 @@ extern std::atomic<void *> g_libcoredevice;
 
 // How a missing symbol is treated.
 enum ftx_bind_kind {
-    FTX_BIND_REQUIRED,  // logged; binding stops, later symbols stay unbound, result -1
-    FTX_BIND_OPTIONAL,  // logged; the fallback (or null) goes in and binding goes on
-    FTX_BIND_SILENT,    // left null without a word; binding goes on
-    FTX_BIND_IF_UNSET,  // as SILENT, and looked up only while its pointer is still null
+    FTX_BIND_REQUIRED,           // logged; binding stops, later symbols stay unbound, result -1
+    FTX_BIND_OPTIONAL,           // logged; the fallback (or null) goes in and binding goes on
+    FTX_BIND_SILENT,             // left null without a word; binding goes on
+    FTX_BIND_IF_UNSET,           // as SILENT, and looked up only while its pointer is still null
+    FTX_BIND_REQUIRED_IF_UNSET,  // as REQUIRED, and looked up only while still null
 };
 
 // One row of a binding table.

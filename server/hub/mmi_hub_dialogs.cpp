@@ -12,7 +12,7 @@
 #include "hub/hub_internal.h"
 #include "hub/mmi_mainwnd.h"
 #include "mmi_dialog.h"
-#include "pending/aging.h"
+#include "AgingTest/mmi_aging.h"
 #include "session/mmi_autotest.h"
 
 std::atomic<int> g_dialogcouldshow{1};

@@ -11,7 +11,7 @@
 #include "mmi_bars.h"
 #include "mmi_menulist.h"
 #include "mmi_theme.h"
-#include "pending/aging.h"
+#include "AgingTest/mmi_aging.h"
 #include "pending/coupling.h"
 #include "wifi/mmi_wifi.h"
 #include "screens/mmi_devicetest.h"

@@ -19,12 +19,11 @@
 #include "mmi_bars.h"
 #include "mmi_guithread.h"
 #include "mmi_theme.h"
-#include "pending/aging.h"
+#include "AgingTest/mmi_aging.h"
 #include "session/mmi_autotest.h"
 #include "session/mmi_testitem.h"
 
 std::atomic<HWND> g_hMainWnd{HWND_INVALID};
-std::atomic<int> g_deviceIsAgingTest{0};
 
 namespace hub {
 
@@ -161,6 +160,7 @@ void start_menu_services() {
                                                      batteryVoltobserver_cb);
     }
     if (Check_AgingCfg_Exist()) {
+        LOGD("%s aging marker found: the aging test resumes", "kmt_CreateMainMenuWnd");
         g_deviceIsAgingTest = 1;
         tp_os_thread_create("AGING_RESUME", 0, 0, mmi_AgingTest_Wnd_Thread, nullptr);
     }

@@ -8,9 +8,9 @@
 #include <atomic>
 
 #include "mmi_msg.h"
+#include "session/mmi_runstate.h"
 
 extern std::atomic<HWND> g_hMainWnd;  // the hub; HWND_INVALID before it exists
-extern std::atomic<int> g_deviceIsAgingTest;
 
 // Screen geometry of the hub, from the screen size (integer division throughout).
 struct mmi_hub_layout {

@@ -133,7 +133,7 @@ int mmi_listscreen_open(const mmi_listscreen_desc *d) {
         ShowWindow(open, SW_SHOWNORMAL);
         return 0;
     }
-    HWND hWnd = mmi_testwnd_create(d->caption, list_proc, reinterpret_cast<DWORD>(d));
+    HWND hWnd = mmi_testwnd_create(d->caption, list_proc, reinterpret_cast<DWORD>(d), d->style);
     if (hWnd == HWND_INVALID) return -1;
     *d->window = hWnd;
     ShowWindow(hWnd, SW_SHOWNORMAL);

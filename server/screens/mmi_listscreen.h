@@ -19,6 +19,7 @@ struct mmi_listscreen_desc {
     void (*choose)(int row);  // Enter or a tap on row; may be null
     UINT refreshMessage;      // rebuilds the rows when received
     std::atomic<HWND> *window;
+    DWORD style = WS_CAPTION | WS_VISIBLE;  // of the window between the bars
 };
 
 // Opens the screen, or shows it again when it is open. 0, or -1 when it cannot be made.

@@ -1,6 +1,7 @@
 #include "session/mmi_runstate.h"
 
 std::atomic<int> g_bAutoTestRunning{0};
+std::atomic<int> g_deviceIsAgingTest{0};
 
 namespace {
 

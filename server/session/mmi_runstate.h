@@ -7,6 +7,9 @@
 
 // 1 while an automatic run is active; results are recorded and chained only then.
 extern std::atomic<int> g_bAutoTestRunning;
+// 1 while an aging (burn-in) run is in progress, from its start (or its resume after a
+// reboot) until its window closes.
+extern std::atomic<int> g_deviceIsAgingTest;
 
 // The runs a test window can belong to.
 enum mmi_run_kind {

@@ -149,10 +149,10 @@ HWND create_main(const char *caption, WNDPROC proc, DWORD addData, DWORD style, 
 
 }  // namespace
 
-HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData) {
+HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData, DWORD style) {
     RECT rc;
     mmi_testwnd_rect(g_ptScreenInfo.width, g_ptScreenInfo.height, &rc);
-    return create_main(caption, proc, addData, WS_CAPTION | WS_VISIBLE, WS_EX_NONE, rc);
+    return create_main(caption, proc, addData, style, WS_EX_NONE, rc);
 }
 
 HWND mmi_testwnd_create_full(const char *caption, WNDPROC proc, DWORD addData) {

@@ -91,7 +91,8 @@ LRESULT mmi_testwnd_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam);
 void mmi_testwnd_rect(int w, int h, RECT *out);
 // Creates (not shows) a window in that rectangle, hosted by the main window, on the GUI
 // thread; addData reaches MSG_CREATE. HWND_INVALID on failure (logged).
-HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData);
+HWND mmi_testwnd_create(const char *caption, WNDPROC proc, DWORD addData,
+                        DWORD style = WS_CAPTION | WS_VISIBLE);
 // The same over the whole screen, title strip and soft-key bar included (topmost), shown.
 HWND mmi_testwnd_create_full(const char *caption, WNDPROC proc, DWORD addData);
 // The title control (titleKey translated) and the window fonts, in MSG_CREATE.

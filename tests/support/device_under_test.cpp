@@ -173,7 +173,16 @@ void DeviceUnderTest::setScreen(int w, int h) {
 }
 
 bool DeviceUnderTest::start() {
+    return spawn(false);
+}
+
+bool DeviceUnderTest::startLauncher() {
+    return spawn(true);
+}
+
+bool DeviceUnderTest::spawn(bool launcher) {
     std::string exe = buildDir() + "/bin/ftx-mmi";
+    std::string script = sourceDir() + "/tools/run.sh";
     std::string out = root_ + "/log/stdout.txt";
     pid_ = fork();
     if (pid_ < 0) return false;
@@ -182,6 +191,7 @@ bool DeviceUnderTest::start() {
         setenv("FTX_DISPLAY", "headless", 1);
         setenv("FTX_PC_PORT", std::to_string(port_).c_str(), 1);
         setenv("LD_LIBRARY_PATH", (buildDir() + "/lib").c_str(), 1);
+        setenv("FTX_TOP", sourceDir().c_str(), 1);
         for (const auto &e : env_)
             setenv(e.first.c_str(), e.second.c_str(), 1);
         int fd = open(out.c_str(), O_WRONLY | O_CREAT | O_APPEND, 0644);
@@ -190,7 +200,11 @@ bool DeviceUnderTest::start() {
             dup2(fd, 2);
             close(fd);
         }
-        execl(exe.c_str(), "ftx-mmi", static_cast<char *>(nullptr));
+        if (launcher)
+            execl("/bin/bash", "bash", script.c_str(), "--root", root_.c_str(), "--headless",
+                  static_cast<char *>(nullptr));
+        else
+            execl(exe.c_str(), "ftx-mmi", static_cast<char *>(nullptr));
         _exit(127);
     }
     status_ = -1;

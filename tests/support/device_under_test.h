@@ -44,6 +44,10 @@ class DeviceUnderTest {
 
     // Starts ftx-mmi; true once started (the console is not awaited).
     bool start();
+    // Starts it through the launcher, tools/run.sh (as ./ftx run --headless does), which then
+    // is the process: its standard error and the application's go to /log/stdout.txt, and
+    // stop() ends both.
+    bool startLauncher();
     // Waits until the console answers; false when the process ended or time ran out.
     bool waitConsole(int timeoutMs = 10000);
     // Starts and waits for the console, for the main menu's window and, when the
@@ -90,6 +94,8 @@ class DeviceUnderTest {
     static std::string buildDir();
 
   private:
+    bool spawn(bool launcher);
+
     std::string root_;
     int port_ = 0;
     pid_t pid_ = -1;

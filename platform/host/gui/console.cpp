@@ -21,6 +21,7 @@
 #include "devfs.h"
 #include "ftx_host.h"
 #include "gui_internal.h"
+#include "kernel_files.h"
 #include "minigui/ftx_gui.h"
 
 namespace ftxgui {
@@ -181,10 +182,16 @@ int do_idle(const ConsoleRequest &r, std::string &, std::string &why) {
     return 0;
 }
 
+int do_wake(const ConsoleRequest &, std::string &, std::string &why) {
+    if (ftxhost::resume_by_key()) return 0;
+    why = "not suspended";
+    return -1;
+}
+
 // Indexed by ConsoleCmd.
-const ConsoleHandler kHandlers[] = {do_key,     do_touch,   do_tap,    do_screenshot,
-                                    do_windows, do_screen,  do_help,   do_hw,
-                                    do_idle,    do_gesture, do_gesture};
+const ConsoleHandler kHandlers[] = {do_key,     do_touch,   do_tap,     do_screenshot,
+                                    do_windows, do_screen,  do_help,    do_hw,
+                                    do_idle,    do_gesture, do_gesture, do_wake};
 
 void serve_client(int fd) {
     std::string pending;

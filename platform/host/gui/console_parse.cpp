@@ -253,6 +253,8 @@ const Command kCommands[] = {
     {"idle", CON_IDLE, parse_idle,
      "idle [MS]                wait until input and windows have nothing left to do"},
     {"hw", CON_HW, parse_hw, "hw LINE                  a line for the simulated hardware"},
+    {"wake", CON_WAKE, parse_bare,
+     "wake                     wakes the suspended handset as a key press does"},
     {"help", CON_HELP, parse_bare, "help                     this list"},
 };
 

@@ -17,6 +17,7 @@ enum ConsoleCmd {
     CON_IDLE,
     CON_SWIPE,
     CON_PATH,
+    CON_WAKE,
 };
 
 enum ConsoleAction { ACT_NONE, ACT_DOWN, ACT_UP, ACT_PRESS, ACT_MOVE };

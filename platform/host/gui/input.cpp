@@ -8,6 +8,7 @@
 #include <android/log.h>
 
 #include "gui_internal.h"
+#include "kernel_files.h"
 #include "minigui/ftx_gui.h"
 
 namespace ftxgui {
@@ -205,6 +206,8 @@ int InitGUIIAL(void) {
 }
 
 int ftx_gui_inject(int kind, int a, int b) {
+    // A key press wakes a suspended handset (and reaches the application as well).
+    if (kind == FTX_INPUT_KEYDOWN) ftxhost::resume_by_key();
     if (!g_running.load() || kind < FTX_INPUT_KEYDOWN || kind > FTX_INPUT_TOUCHUP) return -1;
     std::lock_guard<std::mutex> lk(g_inLock);
     g_events.push_back(InputEvent{kind, a, b});

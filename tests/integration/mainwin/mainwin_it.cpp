@@ -141,6 +141,15 @@ TEST_F(RunningTest, MenuGeometryAndRows) {
     ASSERT_TRUE(dut_.consoleOk("tap 300 " + std::to_string(58 + 96 * 4 + 48)));
     ASSERT_TRUE(dut_.waitLog("ScrollViewProc choose 4"));
     EXPECT_EQ(dut_.logPos("ScrollViewProc choose 5"), std::string::npos);  // five rows only
+    // Row 4 opened the aging result list; back leaves it for the menu.
+    ASSERT_TRUE(dut_.waitLog("aging result list opened"));
+    ASSERT_TRUE(dut_.consoleOk("key press 61"));
+    ASSERT_TRUE(dut_wait_until(
+        [&] {
+            const std::string w = windows();
+            return w.find("caption=\"Aging\"") == std::string::npos;
+        },
+        5000));
     // By keys: down then Enter chooses a row once more.
     ASSERT_TRUE(dut_.consoleOk("key press 108"));
     ASSERT_TRUE(dut_.consoleOk("key press 28"));

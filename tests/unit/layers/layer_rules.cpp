@@ -25,6 +25,7 @@ const Layer kLayers[] = {
     {"server/screens", 5, false},
     {"server/pcba", 5, false},
     {"server/wifi", 5, false},
+    {"server/AgingTest", 5, false},
     {"server/adbd_connection", 6, false},
     {"server/hub", 7, false},
     {"server", 8, true},  // the program's start
