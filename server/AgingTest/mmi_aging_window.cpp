@@ -93,17 +93,8 @@ Layout layout_now() {
 
 // ---- painting ----
 
-void text_at(HDC hdc, int font, int colour, const char *text, RECT box, UINT format) {
-    if (g_mmiLogFont[font]) SelectFont(hdc, g_mmiLogFont[font]);
-    SetTextColor(hdc, mmi_pixel(colour));
-    DrawText(hdc, text, -1, &box, format);
-}
-
-void key_at(HDC hdc, int font, int colour, const char *key, RECT box, UINT format) {
-    char text[MMI_TESTWND_TEXT_SIZE];
-    mmi_translate(key, text, sizeof text);
-    text_at(hdc, font, colour, text, box, format);
-}
+constexpr auto &text_at = mmi_testwnd_text_at;
+constexpr auto &key_at = mmi_testwnd_key_at;
 
 constexpr UINT kCentred = DT_CENTER | DT_VCENTER | DT_SINGLELINE;
 constexpr UINT kLeft = DT_LEFT | DT_VCENTER | DT_SINGLELINE;

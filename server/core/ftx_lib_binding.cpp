@@ -326,6 +326,35 @@ int ftx_bind_symbols(void *handle, const char *libLabel, const char *tag, const 
     return 0;
 }
 
+int ftx_own_library_open(std::atomic<void *> *handle, const char *file, const char *tag,
+                         const ftx_own_op *ops, int count) {
+    void *lib = dlopen(file, RTLD_NOW);
+    if (lib == nullptr) {
+        __android_log_print(ANDROID_LOG_ERROR, tag, "FATAL ERROR: could not dlopen %s: %s", file,
+                            dlerror());
+        return -1;
+    }
+    handle->store(lib);
+    for (int i = 0; i < count; i++) {
+        void *p = dlsym(lib, ops[i].name);
+        if (p == nullptr) {
+            __android_log_print(ANDROID_LOG_ERROR, tag, "FATAL ERROR: could not dlsym %s\n",
+                                ops[i].name);
+            ftx_own_library_close(handle, ops, count);
+            return -1;
+        }
+        ops[i].slot->set(p);
+    }
+    return 0;
+}
+
+void ftx_own_library_close(std::atomic<void *> *handle, const ftx_own_op *ops, int count) {
+    for (int i = 0; i < count; i++)
+        ops[i].slot->set(nullptr);
+    void *lib = handle->exchange(nullptr);
+    if (lib != nullptr) dlclose(lib);
+}
+
 void ftx_binding_set_fallbacks(const ftx_binding_fallbacks *fallbacks) {
     s_handedReadFlags.set(fallbacks ? fn_addr(fallbacks->readFuncTestInfoFlags) : nullptr);
     s_handedWriteFlags.set(fallbacks ? fn_addr(fallbacks->writeFuncTestInfoFlags) : nullptr);

@@ -223,6 +223,20 @@ struct ftx_binding_fallbacks {
 };
 void ftx_binding_set_fallbacks(const ftx_binding_fallbacks *fallbacks);
 
+// A library a test window opens when it opens and closes when it closes (the coupling
+// tests'): its operations in look-up order.
+struct ftx_own_op {
+    const char *name;
+    ftx_hw_slot *slot;
+};
+// Opens file at once (RTLD_NOW) and fills each slot in order. Logs under tag "FATAL ERROR:
+// could not dlopen FILE: TEXT", or at the first missing operation "FATAL ERROR: could not
+// dlsym NAME" and closes the library again. 0, or -1.
+int ftx_own_library_open(std::atomic<void *> *handle, const char *file, const char *tag,
+                         const ftx_own_op *ops, int count);
+// Empties the slots and closes the library; nothing when it is not open.
+void ftx_own_library_close(std::atomic<void *> *handle, const ftx_own_op *ops, int count);
+
 // Looks the rows up in order in handle, logging failures under tag as
 // "FATAL ERROR: could not dlsym <libLabel>::<name>" and "error = <dlerror>,<binder>".
 // 0 when every required row was bound, -1 at the first missing required one.

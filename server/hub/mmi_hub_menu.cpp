@@ -12,7 +12,7 @@
 #include "mmi_menulist.h"
 #include "mmi_theme.h"
 #include "AgingTest/mmi_aging.h"
-#include "pending/coupling.h"
+#include "coupling/mmi_coupling.h"
 #include "wifi/mmi_wifi.h"
 #include "screens/mmi_devicetest.h"
 #include "screens/mmi_infoscreen.h"

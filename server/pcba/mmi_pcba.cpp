@@ -257,17 +257,8 @@ void stop_check(const Check &c) {
 
 // ---- the window ----
 
-void text_at(HDC hdc, PLOGFONT font, int colour, const char *text, RECT box, UINT format) {
-    if (font) SelectFont(hdc, font);
-    SetTextColor(hdc, mmi_pixel(colour));
-    DrawText(hdc, text, -1, &box, format);
-}
-
-void key_at(HDC hdc, PLOGFONT font, int colour, const char *key, RECT box, UINT format) {
-    char text[MMI_TESTWND_TEXT_SIZE];
-    mmi_translate(key, text, sizeof text);
-    text_at(hdc, font, colour, text, box, format);
-}
+constexpr auto &text_at = mmi_testwnd_text_at;
+constexpr auto &key_at = mmi_testwnd_key_at;
 
 // Where the window draws, for a screen w x h: the heading band, the check's name, then
 // either the progress (a status line over a bar) or the value (its label over it), the
@@ -326,8 +317,7 @@ void paint_progress(HDC hdc, const Check &c, const Run &r, const Layout &l) {
     } else {
         tp_os_strlcpy(text, word, sizeof text);
     }
-    text_at(hdc, g_mmiLogFont[3], MMI_COLOUR_TEXT, text, l.status,
-            DT_LEFT | DT_VCENTER | DT_SINGLELINE);
+    text_at(hdc, 3, MMI_COLOUR_TEXT, text, l.status, DT_LEFT | DT_VCENTER | DT_SINGLELINE);
     const RECT &p = l.progress;
     SetPenColor(hdc, mmi_pixel(MMI_COLOUR_FRAME));
     SetPenWidth(hdc, 1);
@@ -355,9 +345,9 @@ void paint(HWND hWnd, const Check &c) {
     MoveTo(hdc, 0, l.header.bottom);
     LineTo(hdc, w, l.header.bottom);
     const UINT centred = DT_CENTER | DT_VCENTER | DT_SINGLELINE;
-    key_at(hdc, g_mmiLogFont[3], MMI_COLOUR_TEXT, "pcba_Title", l.header, centred);
-    key_at(hdc, g_mmiLogFont[4], MMI_COLOUR_TEXT, "pcba_ByPc", l.footer, centred);
-    key_at(hdc, g_mmiLogFont[1], MMI_COLOUR_TEXT, c.titleKey, l.name, centred);
+    key_at(hdc, 3, MMI_COLOUR_TEXT, "pcba_Title", l.header, centred);
+    key_at(hdc, 4, MMI_COLOUR_TEXT, "pcba_ByPc", l.footer, centred);
+    key_at(hdc, 1, MMI_COLOUR_TEXT, c.titleKey, l.name, centred);
     if (r.verdict == PENDING) {
         paint_progress(hdc, c, r, l);
         EndPaint(hWnd, hdc);
@@ -368,17 +358,16 @@ void paint(HWND hWnd, const Check &c) {
     if (r.hasValue || c.kind != Kind::Event) {
         char value[MMI_TESTWND_TEXT_SIZE];
         value_text(c, r, value, sizeof value);
-        key_at(hdc, g_mmiLogFont[3], MMI_COLOUR_TEXT, c.valueKey, l.status, centred);
+        key_at(hdc, 3, MMI_COLOUR_TEXT, c.valueKey, l.status, centred);
         if (c.kind == Kind::Camera)
-            text_at(hdc, g_mmiLogFont[4], colour, value, l.value, DT_CENTER | DT_WORDBREAK);
+            text_at(hdc, 4, colour, value, l.value, DT_CENTER | DT_WORDBREAK);
         else
-            text_at(hdc, g_mmiLogFont[1], colour, value, l.value, centred);
+            text_at(hdc, 1, colour, value, l.value, centred);
     }
     // The verdict on a band of its colour, to be seen from across the bench.
     SetBrushColor(hdc, mmi_pixel(colour));
     FillBox(hdc, l.verdict.left, l.verdict.top, RECTW(l.verdict), RECTH(l.verdict));
-    key_at(hdc, g_mmiLogFont[1], MMI_COLOUR_WINDOW, passed ? "pcba_Pass" : "pcba_Fail", l.verdict,
-           centred);
+    key_at(hdc, 1, MMI_COLOUR_WINDOW, passed ? "pcba_Pass" : "pcba_Fail", l.verdict, centred);
     if (!passed && r.reason != REASON_NONE) {
         char why[MMI_TESTWND_TEXT_SIZE], text[MMI_TESTWND_TEXT_SIZE * 2];
         mmi_translate(kReasonKeys[r.reason], why, sizeof why);
@@ -390,7 +379,7 @@ void paint(HWND hWnd, const Check &c) {
             snprintf(text, sizeof text, "%s \"%s\"", why, r.text);
         else
             tp_os_strlcpy(text, why, sizeof text);
-        text_at(hdc, g_mmiLogFont[4], MMI_COLOUR_FAIL, text, l.reason, DT_CENTER | DT_WORDBREAK);
+        text_at(hdc, 4, MMI_COLOUR_FAIL, text, l.reason, DT_CENTER | DT_WORDBREAK);
     }
     EndPaint(hWnd, hdc);
 }

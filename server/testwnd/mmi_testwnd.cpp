@@ -118,6 +118,18 @@ int mmi_testwnd_close_others(HWND keep) {
 
 // ---- helpers ----
 
+void mmi_testwnd_text_at(HDC hdc, int font, int colour, const char *text, RECT box, UINT format) {
+    if (font >= 0 && font < 7 && g_mmiLogFont[font]) SelectFont(hdc, g_mmiLogFont[font]);
+    SetTextColor(hdc, mmi_pixel(colour));
+    DrawText(hdc, text, -1, &box, format);
+}
+
+void mmi_testwnd_key_at(HDC hdc, int font, int colour, const char *key, RECT box, UINT format) {
+    char text[MMI_TESTWND_TEXT_SIZE];
+    mmi_translate(key, text, sizeof text);
+    mmi_testwnd_text_at(hdc, font, colour, text, box, format);
+}
+
 void mmi_translate(const char *key, char *out, size_t size) {
     tp_os_strlcpy(out, key, size);
     Read_LangCfgFromList(key, out);

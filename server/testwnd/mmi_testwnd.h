@@ -110,6 +110,10 @@ void mmi_testwnd_draw_row(HDC hdc, int top, int height, const char *label, const
                           bool passed, int valueRight);
 // The text of a language key, or the key itself when the language file lacks it.
 void mmi_translate(const char *key, char *out, size_t size);
+// Text in a box, in one of the hub's fonts (an index of g_mmiLogFont) and a palette colour;
+// the key form translates a language key first.
+void mmi_testwnd_text_at(HDC hdc, int font, int colour, const char *text, RECT box, UINT format);
+void mmi_testwnd_key_at(HDC hdc, int font, int colour, const char *key, RECT box, UINT format);
 // Shows the pass label (wParam 5) or only the fail label, and the title in the strip.
 void mmi_testwnd_show_keys(HWND hWnd, const char *titleKey, WPARAM wParam);
 // Starts the fool-proof thread that sends MSG_TIMER 5 to st->hwnd after `seconds`.

@@ -1,5 +1,5 @@
-// Every PC command handler, declared once (the rows of the command table name them; a row
-// still marked pending names one that does not exist yet). Signature AtCmdFun: parm is the
+// Every PC command handler, declared once (the rows of the command table name them).
+// Signature AtCmdFun: parm is the
 // text after the command (parmLen bytes), reply/replySize the channel's reply buffer; bit 0
 // of the answer is the success flag. The dialog-closing handler belongs to the dialogs.
 #pragma once

@@ -115,6 +115,7 @@ class RunningTest : public ::testing::Test {
     void SetUp() override {
         dut_.setConfig("MAIN_UI", "aging", "");
         dut_.setConfig("MAIN_UI", "coupleTest", "1");
+        dut_.setConfig("MAIN_UI", "signalCouple", "0");  // the coupling row opens nothing
         ASSERT_TRUE(dut_.startToMenu());
         // The first battery record has arrived (the title strip shows the charger).
         ASSERT_TRUE(dut_.waitLog("TitleInfoShow begin"));

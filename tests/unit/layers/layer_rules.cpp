@@ -21,11 +21,11 @@ const Layer kLayers[] = {
     {"server/core", 2, false},
     {"server/session", 3, false},
     {"server/testwnd", 4, false},
-    {"server/pending", 4, false},
     {"server/screens", 5, false},
     {"server/pcba", 5, false},
     {"server/wifi", 5, false},
     {"server/AgingTest", 5, false},
+    {"server/coupling", 5, false},
     {"server/adbd_connection", 6, false},
     {"server/hub", 7, false},
     {"server", 8, true},  // the program's start

@@ -102,7 +102,7 @@ TEST(IncludeRules, EachBrokenRuleIsReportedWithItsPlace) {
         {"server/adbd_connection/handlers/audio.cpp",
          "#include \"testwnd/misc/mmi_testwnd_vibrator.h\"\n",
          "includes another test area than its own"},
-        {"server/coupling/mmi_coupling.cpp", "", "the folder is in no layer"},
+        {"server/station/mmi_station.cpp", "", "the folder is in no layer"},
     };
     for (const Case &c : cases) {
         Tree t;
