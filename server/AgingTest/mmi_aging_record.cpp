@@ -6,6 +6,7 @@
 #include <string.h>
 #include <unistd.h>
 
+#include "core/mmi_file.h"
 #include "devfs.h"
 #include "ftx_profile.h"
 #include "tp_os.h"
@@ -137,26 +138,16 @@ int mmi_aging_record_save(const mmi_aging_record *r, const char *path) {
     char text[4096];
     const int len = mmi_aging_record_format(r, text, sizeof text);
     if (len < 0) return -1;
-    char tmp[512];
-    if (snprintf(tmp, sizeof tmp, "%s.tmp", path) >= static_cast<int>(sizeof tmp)) return -1;
-    FILE *fp = dev_fopen(tmp, "w");
-    if (fp == nullptr) return -1;
-    const bool wrote = fwrite(text, 1, static_cast<size_t>(len), fp) == static_cast<size_t>(len) &&
-                       fflush(fp) == 0 && fsync(fileno(fp)) == 0;
-    if (fclose(fp) != 0 || !wrote) {
-        dev_unlink(tmp);
-        return -1;
-    }
-    return dev_rename(tmp, path) == 0 ? 0 : -1;
+    return mmi_file_replace(path, text, static_cast<size_t>(len));
 }
 
-int mmi_aging_record_parse(mmi_aging_record *r, const char *text, size_t len) {
+namespace {
+
+// The text a record is read from: the profile reader wants it terminated.
+thread_local char s_text[FTX_PROFILE_BUF_SIZE];
+
+int parse_terminated(mmi_aging_record *r, const char *buf) {
     memset(r, 0, sizeof *r);
-    // The profile reader wants a terminated buffer of its own size.
-    static thread_local char buf[FTX_PROFILE_BUF_SIZE];
-    if (len >= sizeof buf) len = sizeof buf - 1;
-    memcpy(buf, text, len);
-    buf[len] = '\0';
     char v[MMI_AGING_FAILURE_SIZE];
     if (!value_of(buf, kAging, "cycles", v, sizeof v)) return -1;
     r->cycles = static_cast<int>(number_of(buf, "cycles", 1, kMaxCount));
@@ -186,14 +177,23 @@ int mmi_aging_record_parse(mmi_aging_record *r, const char *text, size_t len) {
     return 0;
 }
 
+}  // namespace
+
+int mmi_aging_record_parse(mmi_aging_record *r, const char *text, size_t len) {
+    if (len >= sizeof s_text) len = sizeof s_text - 1;
+    memcpy(s_text, text, len);
+    s_text[len] = '\0';
+    return parse_terminated(r, s_text);
+}
+
 int mmi_aging_record_load(mmi_aging_record *r, const char *path) {
     memset(r, 0, sizeof *r);
     FILE *fp = dev_fopen(path, "r");
     if (fp == nullptr) return -1;
-    static thread_local char text[FTX_PROFILE_BUF_SIZE];
-    const size_t n = fread(text, 1, sizeof text - 1, fp);
+    const size_t n = fread(s_text, 1, sizeof s_text - 1, fp);
     fclose(fp);
-    return mmi_aging_record_parse(r, text, n);
+    s_text[n] = '\0';
+    return parse_terminated(r, s_text);
 }
 
 int mmi_aging_record_json(const mmi_aging_record *r, const char *barcode, const char *version,

@@ -599,12 +599,6 @@ void mmi_aging_view_get(mmi_aging_view *out) {
     std::lock_guard<std::mutex> lk(s_lock);
     *out = s_view;
     if (s_alive && s_view.phase != AGING_PHASE_DONE) out->record.elapsed = elapsed_now();
-    if (s_view.video) {
-        out->videoFrame =
-            std::chrono::duration_cast<std::chrono::milliseconds>(Clock::now().time_since_epoch())
-                .count() /
-            100;
-    }
 }
 
 int mmi_aging_run_active(void) {

@@ -19,13 +19,12 @@ enum mmi_aging_phase {
 // A copy of the run's state for the window, taken under the run's lock.
 struct mmi_aging_view {
     mmi_aging_record record;
-    int phase;             // mmi_aging_phase
-    int itemLeft;          // seconds left of a timed item, -1 when the item is not timed
-    int itemSteps;         // steps of the item in progress in one cycle (camera tests, ...)
-    int batteryLevel;      // percent, -1 unknown
-    int batteryTemp;       // tenths of a degree, valid when batteryLevel >= 0
-    int video;             // 1 while the video item wants its moving pattern on screen
-    long long videoFrame;  // advances while the video item runs
+    int phase;         // mmi_aging_phase
+    int itemLeft;      // seconds left of a timed item, -1 when the item is not timed
+    int itemSteps;     // steps of the item in progress in one cycle (camera tests, ...)
+    int batteryLevel;  // percent, -1 unknown
+    int batteryTemp;   // tenths of a degree, valid when batteryLevel >= 0
+    int video;         // 1 while the video item wants its moving pattern on screen
 };
 
 // Thread body of the run (started by mmi_AgingTest_Start_Entry): resumes from the reboot

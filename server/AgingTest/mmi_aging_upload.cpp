@@ -22,6 +22,7 @@
 #include <android/log.h>
 #include <curl/curl.h>
 
+#include "core/mmi_file.h"
 #include "devfs.h"
 #include "ftx_log.h"
 
@@ -115,24 +116,6 @@ bool make_folder(const char *dir) {
     if (is_directory(dir)) return true;
     mkdir_main(dir);
     return is_directory(dir);
-}
-
-// Flushes the folder's entries (the rename) to storage; best effort.
-void sync_folder(const char *dir) {
-    int fd = dev_open(dir, O_RDONLY | O_DIRECTORY);
-    if (fd < 0) return;
-    fsync(fd);
-    close(fd);
-}
-
-// Writes len bytes of data as path, synced to storage; false (nothing left) on failure.
-bool write_synced(const char *path, const char *data, size_t len) {
-    FILE *fp = dev_fopen(path, "wb");
-    if (fp == nullptr) return false;
-    bool ok = fwrite(data, 1, len, fp) == len && fflush(fp) == 0 && fsync(fileno(fp)) == 0;
-    ok = fclose(fp) == 0 && ok;
-    if (!ok) dev_unlink(path);
-    return ok;
 }
 
 bool read_record(const char *path, std::string *out) {
@@ -269,25 +252,20 @@ int mmi_aging_upload_keep(const char *dir, const char *json) {
         LOGE("upload: cannot make the outbox %s", dir);
         return -1;
     }
-    char name[64], temp[sizeof(name) + 4];
+    char name[64];
     snprintf(name, sizeof(name), "%s%010lu_%013lld%s", kPrefix, next_sequence(dir), epoch_ms(),
              kSuffix);
-    snprintf(temp, sizeof(temp), "%s.tmp", name);
-    char path[kPathSize], tempPath[kPathSize];
-    if (!join(dir, name, path, sizeof(path)) || !join(dir, temp, tempPath, sizeof(tempPath))) {
+    char path[kPathSize];
+    if (!join(dir, name, path, sizeof(path))) {
         LOGE("upload: outbox path too long: %s", dir);
         return -1;
     }
-    if (!write_synced(tempPath, json, len)) {
-        LOGE("upload: cannot write %s", tempPath);
+    // Written as NAME.tmp and renamed: a record is whole or absent, and a flush never sends
+    // a neighbour (it does not end in the suffix).
+    if (mmi_file_replace(path, json, len) != 0) {
+        LOGE("upload: cannot write %s", path);
         return -1;
     }
-    if (dev_rename(tempPath, path) != 0) {
-        LOGE("upload: cannot rename %s to %s", tempPath, name);
-        dev_unlink(tempPath);
-        return -1;
-    }
-    sync_folder(dir);
     LOGD("upload: kept %s (%zu bytes)", name, len);
     return 0;
 }

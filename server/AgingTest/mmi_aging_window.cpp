@@ -7,6 +7,7 @@
 #include <string.h>
 
 #include <atomic>
+#include <chrono>
 
 #include <android/log.h>
 
@@ -24,16 +25,11 @@
 namespace {
 
 constexpr int kViewTimer = 1;  // takes the run's view
-constexpr int kStopTimer = 2;  // the first back press expires
 // Timer periods in 10 ms ticks (scaled like every wait).
 constexpr int kViewPeriod = 100;
 constexpr int kVideoPeriod = 10;
-// The operator's 3 s for the second press are real seconds, whatever the clock's scale.
-int stop_period() {
-    const double scale = tp_os_time_scale();
-    const double ticks = scale > 0 ? 300 / scale : 300;
-    return ticks > 1e6 ? 1000000 : static_cast<int>(ticks);
-}
+// The operator's time for the second back press: real seconds, whatever the clock's scale.
+constexpr std::chrono::seconds kStopWindow{3};
 
 std::atomic<HWND> s_window{HWND_INVALID};
 // Set when the run ended: the close then opens the result list.
@@ -41,7 +37,8 @@ std::atomic<int> s_result{0};
 
 // GUI thread only.
 mmi_aging_view s_shown;    // what the window shows
-bool s_stopArmed = false;  // the back key was pressed once
+bool s_stopArmed = false;  // the back key was pressed once, at s_stopArmedAt
+std::chrono::steady_clock::time_point s_stopArmedAt;
 bool s_closing = false;
 long long s_frame = 0;  // of the test pattern
 
@@ -306,20 +303,21 @@ void take_view(HWND hWnd) {
 // ---- the back key ----
 
 void back_pressed(HWND hWnd) {
-    if (s_stopArmed) {
+    if (s_stopArmed && std::chrono::steady_clock::now() - s_stopArmedAt < kStopWindow) {
         AGING_LOG("back pressed again: the operator stops the run");
         SendMessage(hWnd, MSG_CLOSE, 0, 0);
         return;
     }
     AGING_LOG("back pressed once: press it again within 3 s to stop");
     s_stopArmed = true;
-    SetTimer(hWnd, kStopTimer, stop_period());
+    s_stopArmedAt = std::chrono::steady_clock::now();
     const Layout l = layout_now();
     InvalidateRect(hWnd, &l.footer, !s_shown.video);
 }
 
-void stop_expired(HWND hWnd) {
-    KillTimer(hWnd, kStopTimer);
+// The first press's note goes once its time has passed (looked at on every tick).
+void stop_expiry(HWND hWnd) {
+    if (!s_stopArmed || std::chrono::steady_clock::now() - s_stopArmedAt < kStopWindow) return;
     s_stopArmed = false;
     // Under the pattern the note sits on top of it: the whole frame is drawn again.
     const Layout l = layout_now();
@@ -333,7 +331,6 @@ void close_window(HWND hWnd) {
     if (s_closing) return;
     s_closing = true;
     KillTimer(hWnd, kViewTimer);
-    KillTimer(hWnd, kStopTimer);
     s_window = HWND_INVALID;
     // Returns at once when the run has ended; a run this close stops ends here too, its
     // record kept as the result.
@@ -359,8 +356,9 @@ LRESULT aging_proc(HWND hWnd, UINT message, WPARAM wParam, LPARAM lParam) {
             paint(hWnd);
             return 0;
         case MSG_TIMER:
-            if (wParam == kViewTimer) take_view(hWnd);
-            if (wParam == kStopTimer) stop_expired(hWnd);
+            if (wParam != kViewTimer) return 0;
+            take_view(hWnd);
+            stop_expiry(hWnd);
             return 0;
         case MSG_KEYDOWN:
             // Only the back key counts, and a held key's repeats do not: nothing else that

@@ -226,10 +226,13 @@ struct feature_binder {
     const char *tag;
     const ftx_sym_binding *rows;
     int count;
+    bool bareMissingLine;  // the missing library's line does not name the binder
 };
 
 #define FEATURE(name, tag, rows) \
-    { name, tag, rows, COUNT(rows) }
+    { name, tag, rows, COUNT(rows), false }
+#define FEATURE_BARE(name, tag, rows) \
+    { name, tag, rows, COUNT(rows), true }
 const feature_binder kLoopback = FEATURE("load_lib_interface", "FTX_AUDIO_LOOPBACK", kLoopbackSet);
 const feature_binder kHookKey = FEATURE("load_lib_interface", "FTX_HOOKKEY", kHookKeySet);
 const feature_binder kFlashlight =
@@ -261,8 +264,8 @@ const feature_binder kHardVersion =
 const feature_binder kBatteryTest =
     FEATURE("Init_lib_Battery_Interface", "FTX_BATTERY", kBatteryTestSet);
 const feature_binder kCamera = FEATURE("Init_lib_Camera_Interface", "FTX_CAMERA_BACK", kCameraSet);
-const feature_binder kAging = FEATURE("Init_lib_AgingTest_Interface", "AgingTest", kAgingSet);
-const feature_binder kPcba = FEATURE("Init_lib_Interface_all", "FTX_CPU", kPcbaSet);
+const feature_binder kAging = FEATURE_BARE("Init_lib_AgingTest_Interface", "AgingTest", kAgingSet);
+const feature_binder kPcba = FEATURE_BARE("Init_lib_Interface_all", "FTX_CPU", kPcbaSet);
 
 // Writes "error = <text>,<binder>" when the loader has an error text; consumes it.
 void log_loader_error(const char *tag, const char *binder) {
@@ -274,7 +277,7 @@ int bind_feature(const feature_binder &b, const char *tag) {
     if (tag == nullptr) tag = b.tag;
     void *handle = lib_dvk_factory.load();
     if (handle == nullptr) {
-        if (&b == &kPcba || &b == &kAging)
+        if (b.bareMissingLine)
             __android_log_print(ANDROID_LOG_ERROR, tag,
                                 "FATAL ERROR: could not find lib_factory.so\n");
         else

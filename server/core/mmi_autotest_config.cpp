@@ -10,6 +10,7 @@
 
 #include <android/log.h>
 
+#include "core/mmi_file.h"
 #include "devfs.h"
 #include "core/ftx_config.h"
 #include "core/mmi_autotest_config.h"
@@ -156,19 +157,8 @@ int mmi_AutoTest_Modify_ConfigFile(const char *parm) {
     if (mmi_config_set_value(in, domain, key, value, &out) != 0) return 0;
 
     // Written beside and renamed over, so a power cut leaves the old or the new file.
-    const char *tmp = kTmpFile;
-    fp = dev_fopen(tmp, "wb");
-    if (!fp) {
-        CW_ERROR("%s open %s fail.", __func__, tmp);
-        return 0;
-    }
-    bool ok = fwrite(out.data(), 1, out.size(), fp) == out.size();
-    ok = fflush(fp) == 0 && ok;
-    ok = fsync(fileno(fp)) == 0 && ok;
-    ok = fclose(fp) == 0 && ok;
-    if (!ok || dev_rename(tmp, FTX_MAIN_CONFIG_FILE) != 0) {
+    if (mmi_file_replace(FTX_MAIN_CONFIG_FILE, out.data(), out.size()) != 0) {
         CW_ERROR("%s write %s fail.", __func__, FTX_MAIN_CONFIG_FILE);
-        dev_unlink(tmp);
         return 0;
     }
     CW_DEBUG("%s %s,%s=%s", __func__, domain, key, value);

@@ -8,6 +8,7 @@
 
 #include <android/log.h>
 
+#include "core/mmi_file.h"
 #include "devfs.h"
 #include "core/ftx_config.h"
 #include "core/ftx_lib_binding.h"
@@ -333,21 +334,9 @@ void mmi_autotest_end_run(const char *why) {
 }
 
 int mmi_autotest_write_latest_pass(const char *text) {
-    // A power cut must leave the old content or the new one, never a truncated file:
-    // write a neighbour, flush it to the medium, then rename it over the old one.
-    char tmp[MMI_TEXT_SIZE];
-    snprintf(tmp, sizeof(tmp), "%s.tmp", AUTOTEST_LATEST_PASS_FILE);
-    FILE *fp = dev_fopen(tmp, "w");
-    if (!fp) {
-        AT_ERROR("open %s fail.", tmp);
-        return -1;
-    }
-    size_t len = strlen(text);
-    bool ok = fwrite(text, 1, len, fp) == len && fflush(fp) == 0 && fsync(fileno(fp)) == 0;
-    ok = fclose(fp) == 0 && ok;
-    if (!ok || dev_rename(tmp, AUTOTEST_LATEST_PASS_FILE) != 0) {
+    // A power cut must leave the old content or the new one, never a truncated file.
+    if (mmi_file_replace(AUTOTEST_LATEST_PASS_FILE, text, strlen(text)) != 0) {
         AT_ERROR("write %s fail.", AUTOTEST_LATEST_PASS_FILE);
-        dev_unlink(tmp);
         return -1;
     }
     return 0;

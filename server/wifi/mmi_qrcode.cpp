@@ -12,6 +12,7 @@
 
 #include <android/log.h>
 
+#include "core/mmi_file.h"
 #include "devfs.h"
 #include "screens/mmi_identity.h"
 
@@ -135,8 +136,6 @@ int write_bmp(const char *path, const mmi_qr_image *image) {
     if (path == nullptr || image == nullptr || image->width <= 0 || image->height <= 0 ||
         image->rgba.size() != static_cast<size_t>(image->width) * image->height * 4)
         return -1;
-    char temp[kPathSize];
-    if (snprintf(temp, sizeof temp, "%s.new", path) >= static_cast<int>(sizeof temp)) return -1;
     const size_t w = static_cast<size_t>(image->width), h = static_cast<size_t>(image->height);
     const size_t stride = (w * 3 + 3) & ~static_cast<size_t>(3);
     const size_t headerSize = 54;
@@ -164,16 +163,9 @@ int write_bmp(const char *path, const mmi_qr_image *image) {
             out[2] = over_white(src[0], src[3]);
         }
     }
-    FILE *fp = dev_fopen(temp, "wb");
-    if (fp == nullptr) {
-        QR_ERROR("%s: cannot create %s", __func__, temp);
-        return -1;
-    }
-    bool written = fwrite(file.data(), 1, file.size(), fp) == file.size();
-    written = fclose(fp) == 0 && written;
-    if (!written || dev_rename(temp, path) != 0) {
+    // The main menu may be reading the picture: it sees the old one or the new one.
+    if (mmi_file_replace(path, file.data(), file.size()) != 0) {
         QR_ERROR("%s: cannot write %s", __func__, path);
-        dev_unlink(temp);
         return -1;
     }
     return 0;
