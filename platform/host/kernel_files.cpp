@@ -214,6 +214,15 @@ int kernel_close(void *cookie) {
 
 }  // namespace
 
+struct BootText {
+    const char *path;
+    const char *text;
+};
+const BootText kDisplayAtBoot[] = {
+    {"/sys/class/graphics/fb0/blank", "0"},
+    {"/sys/class/leds/lcd-backlight/brightness", "255"},
+};
+
 const char *panel_description(const char *type) {
     if (type != nullptr && strcasecmp(type, "Truly") == 0)
         return "panel=qcom,mdss_dsi_dvkTruly_hx83112a_1080p_video\n";
@@ -223,6 +232,13 @@ const char *panel_description(const char *type) {
 void write_boot_kernel_files() {
     ensure_file(kAlarmFile, "");
     ensure_file(kStateFile, kStates);
+    // The panel comes up lit whatever it was when the handset went down asleep.
+    for (const auto &f : kDisplayAtBoot) {
+        FILE *d = dev_fopen(f.path, "w");
+        if (d == nullptr) continue;
+        fputs(f.text, d);
+        fclose(d);
+    }
     char type[64];
     ftx_device_ini_get("panel", "type", type, sizeof(type), "JDI");
     FILE *f = dev_fopen("/proc/msm_lcd", "w");

@@ -1,6 +1,7 @@
 // Kernel files of the simulated handset. At boot (the application's start) the kernel writes
 // the panel description /proc/msm_lcd, whose driver name carries the panel maker chosen by
-// [panel] type= of sim/device.ini (JDI, the default, or Truly), and makes the RTC alarm and
+// [panel] type= of sim/device.ini (JDI, the default, or Truly), unblanks the panel at full
+// backlight (a handset that went down asleep comes up lit), and makes the RTC alarm and
 // power state files when the root lacks them.
 //
 // Two files act on what is written into them through dev_fopen, as their drivers do (each

@@ -393,6 +393,14 @@ int state_colour(State s) {
     return s == PASSED ? MMI_COLOUR_PASS : s == FAILED ? MMI_COLOUR_FAIL : MMI_COLOUR_TEXT;
 }
 
+// A limit as short as it reads: whole dBm without the tenths (the row's room is narrow).
+void compact_dbm(int tenths, char *out, size_t size) {
+    if (tenths % 10 == 0)
+        snprintf(out, size, "%d", tenths / 10);
+    else
+        mmi_ns_format_dbm(tenths, out, size);
+}
+
 const char *const kStateKeys[] = {"ns_Waiting", "ns_Testing", "ns_Pass", "ns_Fail", "ns_Stopped"};
 
 void draw_row(HDC hdc, const Layout &l, int top, int indent, const char *label, const char *value,
@@ -429,8 +437,9 @@ void draw_current(HDC hdc, const Layout &l, const Progress &p) {
     tr("ns_Band", band, sizeof band);
     tr("ns_Channel", channel, sizeof channel);
     tr("ns_Tx", word, sizeof word);
-    snprintf(text, sizeof text, "%s  %s %d  %s %d  %s %s dBm", kMmiNsTechs[p.tech].name, band,
-             s.band, channel, s.channel, word, power);
+    // Two lines that fit the narrowest screen: where, then what is sent and what comes back.
+    snprintf(text, sizeof text, "%s  %s %d  %s %d", kMmiNsTechs[p.tech].name, band, s.band, channel,
+             s.channel);
     RECT top = l.current, bottom = l.current;
     top.bottom = top.top + l.line;
     bottom.top = top.bottom;
@@ -443,7 +452,7 @@ void draw_current(HDC hdc, const Layout &l, const Progress &p) {
     } else {
         tr("ns_Measuring", level, sizeof level);
     }
-    snprintf(text, sizeof text, "%s %s", tr("ns_Rx", rx, sizeof rx), level);
+    snprintf(text, sizeof text, "%s %s dBm  %s %s", word, power, tr("ns_Rx", rx, sizeof rx), level);
     mmi_testwnd_text_at(hdc, kFont, MMI_COLOUR_TEXT, text, bottom, centred);
 }
 
@@ -466,13 +475,13 @@ void paint(HWND hWnd) {
         if (!plan.enabled) continue;
         const TechResult &tr_ = p.techs[t];
         char limits[64], lo[16], hi[16];
-        mmi_ns_format_dbm(plan.min, lo, sizeof lo);
-        mmi_ns_format_dbm(plan.max, hi, sizeof hi);
+        compact_dbm(plan.min, lo, sizeof lo);
+        compact_dbm(plan.max, hi, sizeof hi);
         snprintf(limits, sizeof limits, "%s..%s", lo, hi);
         if (tr_.reason != R_NONE)
             reason_text(tr_.reason, tr_.op, tr_.rc, 0, plan, value, sizeof value);
         else
-            snprintf(value, sizeof value, "%s  %s", tr(kStateKeys[tr_.state], word, sizeof word),
+            snprintf(value, sizeof value, "%s %s", tr(kStateKeys[tr_.state], word, sizeof word),
                      plan.valid ? limits : "");
         draw_row(hdc, l, top, 0, kMmiNsTechs[t].name, value, state_colour(tr_.state));
         top += l.line;

@@ -124,7 +124,7 @@ TEST(KernelFiles, TheRtcAlarmIsArmedOnceAndClearedByZeroOrAPastTime) {
     EXPECT_EQ(EINVAL, write_file(kState, "disk"));
 }
 
-TEST(KernelFiles, TheKernelMakesThemAtBootAndKeepsAnArmedAlarm) {
+TEST(KernelFiles, TheKernelMakesThemAtBootKeepsAnArmedAlarmAndUnblanksThePanel) {
     TempRoot root;
     errno = 0;
     EXPECT_EQ(nullptr, dev_fopen(kState, "w"));
@@ -134,8 +134,13 @@ TEST(KernelFiles, TheKernelMakesThemAtBootAndKeepsAnArmedAlarm) {
     EXPECT_EQ("", root.read(kAlarm));
     const std::string armed = std::to_string(now_s() + 100) + "\n";
     ASSERT_EQ(0, write_file(kAlarm, armed));
+    // A handset that went down asleep comes up lit, whatever the alarm does.
+    root.write("/sys/class/graphics/fb0/blank", "4");
+    root.write("/sys/class/leds/lcd-backlight/brightness", "0");
     tp_os_thread_init(0, nullptr);
     EXPECT_EQ(armed, root.read(kAlarm));
+    EXPECT_EQ("0", root.read("/sys/class/graphics/fb0/blank"));
+    EXPECT_EQ("255", root.read("/sys/class/leds/lcd-backlight/brightness"));
 }
 
 TEST(Suspend, SleepsUntilTheAlarmAndClearsIt) {
